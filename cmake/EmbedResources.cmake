@@ -1,0 +1,18 @@
+# Stores the launcher's resource image (catalogues, icons, version) in an executable's
+# ELF section ".rsrc", where the program reads it at run time. Call it in the directory
+# that defines the target.
+find_program(VELTRONA_OBJCOPY objcopy REQUIRED)
+
+function(veltrona_embed_resources target)
+    get_property(res GLOBAL PROPERTY VELTRONA_RES_FILE)
+    if(NOT res)
+        message(FATAL_ERROR "veltrona_embed_resources(${target}): the resource image is not defined yet")
+    endif()
+    add_dependencies(${target} veltrona_res)
+    # A changed resource image relinks the target, which runs the step below again.
+    set_property(TARGET ${target} APPEND PROPERTY LINK_DEPENDS "${res}")
+    add_custom_command(TARGET ${target} POST_BUILD
+        COMMAND "${VELTRONA_OBJCOPY}" --add-section ".rsrc=${res}"
+                --set-section-flags .rsrc=noload,readonly "$<TARGET_FILE:${target}>"
+        VERBATIM)
+endfunction()

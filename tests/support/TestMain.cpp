@@ -1,0 +1,41 @@
+// Runs the tests inside a real toolkit application on the X display of the
+// environment. The application is the launcher's own class with its start-up
+// left out, so code that reaches the application object finds the real one.
+#include "app/Veltro3App.h"
+
+#include <gtest/gtest.h>
+#include <wx/evtloop.h>
+#include <wx/init.h>
+
+namespace {
+
+class TestApp : public Veltro3App
+{
+public:
+    bool OnInit() override { return true; }
+    int OnExit() override { return 0; }
+};
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    testing::InitGoogleTest(&argc, argv);
+    if (GTEST_FLAG_GET(list_tests))
+        return RUN_ALL_TESTS();
+
+    wxApp::SetInstance(new TestApp);
+    if (!wxEntryStart(argc, argv) || !wxTheApp->CallOnInit()) {
+        fprintf(stderr, "the toolkit could not start (is DISPLAY set?)\n");
+        return 2;
+    }
+    int result = 0;
+    {
+        wxEventLoop loop;
+        wxEventLoopActivator activate(&loop);
+        result = RUN_ALL_TESTS();
+    }
+    wxTheApp->OnExit();
+    wxEntryCleanup();
+    return result;
+}

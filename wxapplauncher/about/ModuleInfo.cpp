@@ -1,0 +1,4 @@
+#include "about/ModuleInfo.h"
+
+// The module information window is not built yet.
+void ShowModuleInfo(int) {}

@@ -1,0 +1,44 @@
+#include "app/Veltro3App.h"
+
+#include <wx/msgdlg.h>
+#include <wx/settings.h>
+
+namespace {
+
+struct Resolution
+{
+    int width;
+    int height;
+};
+
+const Resolution kResolutionPresets[] = {
+    {800, 600},  {1024, 768},  {1152, 864}, {1280, 768},
+    {1280, 960}, {1280, 1024}, {1280, 600}, {1280, 720},
+};
+
+} // namespace
+
+void Veltro3App::GetMinimumResolution(int preset, int& width, int& height)
+{
+    if (preset < 0 || preset >= int(WXSIZEOF(kResolutionPresets)))
+        preset = 0;
+    width = kResolutionPresets[preset].width;
+    height = kResolutionPresets[preset].height;
+}
+
+bool Veltro3App::CheckScreenResolution(int preset)
+{
+    int width = 0, height = 0;
+    GetMinimumResolution(preset, width, height);
+    const int screenWidth = wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_X, nullptr);
+    const int screenHeight = wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_Y, nullptr);
+    if (screenWidth >= width && screenHeight >= height)
+        return true;
+
+    wxMessageBox(
+        wxString::Format(
+            _("Please set your monitor to a supported resolution.\nMinimum required: %d x %d"),
+            width, height),
+        wxString(), wxOK | wxCENTRE);
+    return false;
+}

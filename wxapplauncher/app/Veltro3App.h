@@ -1,0 +1,49 @@
+// The launcher's application object: start-up checks, the per-user instance
+// lock, the deferred start-up on the first idle event, and shutdown.
+#pragma once
+
+#include <wx/app.h>
+#include <wx/intl.h>
+#include <wx/string.h>
+
+class wxIdleEvent;
+class wxSingleInstanceChecker;
+class wxTimer;
+class CContextualHelp;
+class Veltro3AppLauncherIPCServer;
+class Veltro3AppFrame;
+
+class Veltro3App : public wxApp
+{
+public:
+    Veltro3App();
+    ~Veltro3App() override;
+
+    bool OnInit() override;
+    int OnExit() override;
+
+    void OnIdle(wxIdleEvent& event);
+    void RunDeferredStartup();
+    void OpenPendingFile();
+    bool CheckScreenResolution(int preset);
+    static void GetMinimumResolution(int preset, int& width, int& height);
+
+    void ShowContextHelp(const wxString& page);
+    void ShowHelpTool(const wxString& page);
+
+    CContextualHelp* m_contextualHelp;
+    bool m_initialised;
+    bool m_deferredStartupPending;
+    Veltro3AppLauncherIPCServer* m_launcherServer;
+    wxSingleInstanceChecker* m_singleInstanceChecker;
+    wxTimer* m_splashTimer;
+    wxLocale m_locale;
+    wxString m_pendingFile;
+    Veltro3AppFrame* m_frame;
+
+private:
+    wxDECLARE_EVENT_TABLE();
+};
+
+// The running application object, or null when the toolkit runs another one.
+Veltro3App* GetVeltro3App();

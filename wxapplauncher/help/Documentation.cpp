@@ -1,0 +1,7 @@
+#include "help/Documentation.h"
+
+// Not built yet: these commands do nothing.
+void OpenUserGuide() {}
+void OpenUserForum() {}
+void OpenHowTo() {}
+void ShowHelpToolDialog(const wxString&, const wxString&) {}

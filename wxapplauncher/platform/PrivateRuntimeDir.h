@@ -1,0 +1,9 @@
+// The per-user private directory that holds the instance lock and the IPC sockets.
+#pragma once
+
+#include <wx/string.h>
+
+// $XDG_RUNTIME_DIR/veltrona/, else /tmp/veltrona-<uid>/, created with mode 0700.
+// Empty when the directory cannot be made or is not safe to use: a link, owned
+// by someone else, or open to the group or others.
+wxString GetPrivateRuntimeDir();
