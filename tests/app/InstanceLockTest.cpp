@@ -34,8 +34,8 @@ TEST(InstanceLockTest, OneCopyPerUserAndNoneAfterACrash)
     // system may give to another process: here, to this test.
     first->Kill(SIGKILL);
     ASSERT_TRUE(first->WaitForExit(10000, status));
-    const std::string lock = runtime.Path() + "/veltrona/Zelgrave.Veltrona." +
-                             std::string(wxGetUserId().utf8_str());
+    const std::string lock =
+        runtime.Path() + "/veltrona/Zelgrave.Veltrona." + std::string(wxGetUserId().utf8_str());
     ASSERT_TRUE(std::ifstream(lock).good()) << lock;
     std::ofstream(lock, std::ios::trunc) << getpid() << "\n";
     first.reset();

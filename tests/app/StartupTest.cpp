@@ -1,12 +1,13 @@
 // Start-up and shutdown of the real launcher, run as its own process.
+#include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
 #include "support/X11Client.h"
 #include "support/XvfbServer.h"
-#include "support/GuiWait.h"
 
 #include <gtest/gtest.h>
+#include <wx/defs.h>
 
 #include <cstdlib>
 #include <sys/stat.h>
@@ -85,7 +86,7 @@ TEST_F(StartupTest, CloseBoxEndsTheLauncher)
     ProbeRun launcher(m_install.Path(), {}, Env(screen.Display()));
     ASSERT_TRUE(launcher.WaitForShown());
     X11Client x11(screen.Display());
-    Window frame = 0;
+    XWindowId frame = 0;
     ASSERT_TRUE(WaitFor([&] { return (frame = x11.FindByTitle("Veltrona")) != 0; }));
     x11.RequestClose(frame);
     int status = 0;

@@ -36,17 +36,32 @@ TEST(FrameTest, MenusInOrder)
     EXPECT_EQ(bar->GetMenuLabel(0), "&File");
     EXPECT_EQ(bar->GetMenuLabel(1), "&Help");
 
-    const std::vector<wxString> file = {
-        "1001 Create &Printer Profile...", "1002 Create &Monitor Profile...",
-        "1003 Create &Device Link Profile...", "-", "1005 &Inspect Profile...",
-        "1006 &Edit Profile...", "1004 &Verify Color...", "-", "1007 E&xit"};
+    const std::vector<wxString> file = {"1001 Create &Printer Profile...",
+                                        "1002 Create &Monitor Profile...",
+                                        "1003 Create &Device Link Profile...",
+                                        "-",
+                                        "1005 &Inspect Profile...",
+                                        "1006 &Edit Profile...",
+                                        "1004 &Verify Color...",
+                                        "-",
+                                        "1007 E&xit"};
     EXPECT_EQ(Describe(bar->GetMenu(0)), file);
 
-    const std::vector<wxString> help = {
-        "1015 Veltrona &Help\tF1", "1016 User Guide", "1017 User Forum", "1107 How-To", "-",
-        "1019 &About Veltrona", "1023 About &Modules", "  1025 Quenta Print Studio",
-        "  1026 Zel Display Studio", "  1027 Quenta Link Studio", "  1028 Quenta Inspect Studio",
-        "  1029 Quenta Edit Studio", "  1030 Zel Verify Studio", "-", "1020 Check for Updates..."};
+    const std::vector<wxString> help = {"1015 Veltrona &Help\tF1",
+                                        "1016 User Guide",
+                                        "1017 User Forum",
+                                        "1107 How-To",
+                                        "-",
+                                        "1019 &About Veltrona",
+                                        "1023 About &Modules",
+                                        "  1025 Quenta Print Studio",
+                                        "  1026 Zel Display Studio",
+                                        "  1027 Quenta Link Studio",
+                                        "  1028 Quenta Inspect Studio",
+                                        "  1029 Quenta Edit Studio",
+                                        "  1030 Zel Verify Studio",
+                                        "-",
+                                        "1020 Check for Updates..."};
     EXPECT_EQ(Describe(bar->GetMenu(1)), help);
     frame->Destroy();
 }

@@ -21,8 +21,8 @@
 namespace {
 
 const std::vector<std::string> kAllModules = {
-    "Quenta Print Studio.exe",   "Monitor/Zel Display Studio.exe", "Quenta Link Studio.exe",
-    "ZelVerifyStudio.exe",       "Quenta Inspect Studio.exe",      "Quenta Edit Studio.exe",
+    "Quenta Print Studio.exe", "Monitor/Zel Display Studio.exe", "Quenta Link Studio.exe",
+    "ZelVerifyStudio.exe",     "Quenta Inspect Studio.exe",      "Quenta Edit Studio.exe",
 };
 
 class LaunchModuleTest : public testing::Test
@@ -69,11 +69,12 @@ protected:
     // been started by then.
     std::vector<StandinRecord> StartsBeforeSentinel()
     {
+        const size_t before = ReadRecords(m_log).size();
         Click(1101);
         std::vector<StandinRecord> records;
         WaitFor([&] {
             records = ReadRecords(m_log);
-            return !records.empty() && records.back().exe == Exe("Quenta Print Studio.exe");
+            return records.size() > before && records.back().exe == Exe("Quenta Print Studio.exe");
         });
         EXPECT_FALSE(records.empty());
         if (!records.empty())
@@ -141,8 +142,8 @@ TEST_F(LaunchModuleTest, FileReachesInspectAsOneArgument)
     // What the launcher shows as the command line keeps the plain quoting.
     const ModuleCommand command =
         BuildModuleCommand(*FindModule(1005), "/opt/suite/", wxString::FromUTF8(awkward));
-    EXPECT_EQ(command.CommandLine(), "\"/opt/suite/Quenta Inspect Studio.exe\" \"" +
-                                         wxString::FromUTF8(awkward) + "\"");
+    EXPECT_EQ(command.CommandLine(),
+              "\"/opt/suite/Quenta Inspect Studio.exe\" \"" + wxString::FromUTF8(awkward) + "\"");
 }
 
 TEST_F(LaunchModuleTest, NothingStartsAndNothingShowsWhenThereIsNothingToStart)
@@ -151,7 +152,7 @@ TEST_F(LaunchModuleTest, NothingStartsAndNothingShowsWhenThereIsNothingToStart)
     DialogRecorder dialogs;
     m_view->LaunchModule(999, wxString());
     m_view->LaunchModule(1000, wxString());
-    Menu(1006); // Edit is not installed
+    Menu(1006);  // Edit is not installed
     Click(1105); // nor is Verify
 
     // Modules are looked up in the working directory, not beside the launcher.
@@ -172,12 +173,18 @@ TEST_F(LaunchModuleTest, VerifyGetsTheWindowsLanguageNumber)
         wxLanguage language;
         int number;
     } cases[] = {
-        {wxLANGUAGE_ENGLISH_US, 1033}, {wxLANGUAGE_ENGLISH_UK, 2057},
-        {wxLANGUAGE_PORTUGUESE_BRAZILIAN, 1046}, {wxLANGUAGE_PORTUGUESE, 1033},
-        {wxLANGUAGE_KOREAN, 1033}, {wxLANGUAGE_GERMAN_AUSTRIAN, 1031},
-        {wxLANGUAGE_FRENCH_CANADIAN, 1036}, {wxLANGUAGE_DUTCH_BELGIAN, 1043},
-        {wxLANGUAGE_ITALIAN_SWISS, 1040}, {wxLANGUAGE_SPANISH_MEXICAN, 1034},
-        {wxLANGUAGE_JAPANESE, 1041}, {wxLANGUAGE_CHINESE_SIMPLIFIED, 2052},
+        {wxLANGUAGE_ENGLISH_US, 1033},
+        {wxLANGUAGE_ENGLISH_UK, 2057},
+        {wxLANGUAGE_PORTUGUESE_BRAZILIAN, 1046},
+        {wxLANGUAGE_PORTUGUESE, 1033},
+        {wxLANGUAGE_KOREAN, 1033},
+        {wxLANGUAGE_GERMAN_AUSTRIAN, 1031},
+        {wxLANGUAGE_FRENCH_CANADIAN, 1036},
+        {wxLANGUAGE_DUTCH_BELGIAN, 1043},
+        {wxLANGUAGE_ITALIAN_SWISS, 1040},
+        {wxLANGUAGE_SPANISH_MEXICAN, 1034},
+        {wxLANGUAGE_JAPANESE, 1041},
+        {wxLANGUAGE_CHINESE_SIMPLIFIED, 2052},
         {wxLANGUAGE_CHINESE_TRADITIONAL, 1033},
     };
     for (const auto& c : cases) {

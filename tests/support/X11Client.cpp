@@ -1,5 +1,7 @@
 #include "support/X11Client.h"
 
+#include <X11/Xlib.h>
+
 #include <X11/Xatom.h>
 #include <X11/Xutil.h>
 
@@ -52,30 +54,35 @@ Window Search(Display* display, Window parent, const std::string& title, int dep
     return found;
 }
 
-int IgnoreErrors(Display*, XErrorEvent*) { return 0; }
+int IgnoreErrors(Display*, XErrorEvent*)
+{
+    return 0;
+}
+
+XErrorHandler g_previousHandler = nullptr;
 
 } // namespace
 
 X11Client::X11Client(const std::string& display)
-    : m_display(XOpenDisplay(display.empty() ? nullptr : display.c_str())),
-      // Windows of other processes may vanish while they are looked at.
-      m_previousHandler(XSetErrorHandler(IgnoreErrors))
+    : m_display(XOpenDisplay(display.empty() ? nullptr : display.c_str()))
 {
+    // Windows of other processes may vanish while they are looked at.
+    g_previousHandler = XSetErrorHandler(IgnoreErrors);
 }
 
 X11Client::~X11Client()
 {
     if (m_display)
         XCloseDisplay(m_display);
-    XSetErrorHandler(m_previousHandler);
+    XSetErrorHandler(g_previousHandler);
 }
 
-Window X11Client::FindByTitle(const std::string& title)
+XWindowId X11Client::FindByTitle(const std::string& title)
 {
     return m_display ? Search(m_display, DefaultRootWindow(m_display), title, 3) : 0;
 }
 
-Window X11Client::ActiveWindow()
+XWindowId X11Client::ActiveWindow()
 {
     if (!m_display)
         return 0;
@@ -94,7 +101,7 @@ Window X11Client::ActiveWindow()
     return active;
 }
 
-void X11Client::RequestClose(Window window)
+void X11Client::RequestClose(XWindowId window)
 {
     XEvent event = {};
     event.xclient.type = ClientMessage;

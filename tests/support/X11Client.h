@@ -2,9 +2,11 @@
 // active window and asks a window to close, as a user's window manager would.
 #pragma once
 
-#include <X11/Xlib.h>
-
 #include <string>
+
+// Xlib's own header defines macros (None, Bool) that clash with other code.
+struct _XDisplay;
+using XWindowId = unsigned long;
 
 class X11Client
 {
@@ -17,13 +19,12 @@ public:
     bool IsOpen() const { return m_display != nullptr; }
 
     // A window with exactly this title (_NET_WM_NAME, else WM_NAME), or 0.
-    Window FindByTitle(const std::string& title);
+    XWindowId FindByTitle(const std::string& title);
     // The window manager's active window, or 0.
-    Window ActiveWindow();
+    XWindowId ActiveWindow();
     // Sends WM_DELETE_WINDOW, as the close box does.
-    void RequestClose(Window window);
+    void RequestClose(XWindowId window);
 
 private:
-    Display* m_display;
-    XErrorHandler m_previousHandler;
+    _XDisplay* m_display;
 };
