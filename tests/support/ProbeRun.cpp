@@ -1,6 +1,7 @@
 #include "support/ProbeRun.h"
 
 #include "support/GuiWait.h"
+#include "support/StandinLog.h"
 
 #include <cerrno>
 #include <csignal>
@@ -15,20 +16,6 @@
 extern char** environ;
 
 namespace {
-
-std::string Unescape(const std::string& text)
-{
-    std::string out;
-    for (size_t i = 0; i < text.size(); ++i) {
-        if (text[i] == '\\' && i + 1 < text.size()) {
-            const char next = text[++i];
-            out += next == 'n' ? '\n' : next == 't' ? '\t' : next;
-        } else {
-            out += text[i];
-        }
-    }
-    return out;
-}
 
 int g_probeCount = 0;
 
@@ -94,7 +81,7 @@ std::vector<ProbeEvent> ProbeRun::Events() const
         std::string field;
         std::getline(fields, event.kind, '\t');
         while (std::getline(fields, field, '\t'))
-            event.fields.push_back(Unescape(field));
+            event.fields.push_back(UnescapeField(field));
         events.push_back(event);
     }
     return events;
@@ -118,8 +105,8 @@ bool ProbeRun::WaitForExit(int timeoutMs, int& status)
 {
     if (m_pid <= 0 || m_reaped)
         return false;
-    m_reaped = WaitFor([this, &status] { return waitpid(m_pid, &status, WNOHANG) == m_pid; },
-                       timeoutMs);
+    m_reaped =
+        WaitFor([this, &status] { return waitpid(m_pid, &status, WNOHANG) == m_pid; }, timeoutMs);
     return m_reaped;
 }
 

@@ -1,0 +1,22 @@
+// The start record a stand-in appends to its log: who was started, where and
+// with which arguments, in a line format the tests parse back.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace standin {
+
+// Backslash, newline and tab become two-character escapes; nothing else changes.
+std::string EscapeField(const std::string& text);
+
+std::string FormatRecord(const std::vector<std::string>& argv, long pid, const std::string& cwd);
+
+// The working directory, or an empty string when it cannot be read.
+std::string CurrentDirectory();
+
+// Appends with one write(2) on an O_APPEND descriptor, so records of programs
+// started at the same moment never interleave.
+bool AppendRecord(const std::string& path, const std::string& record);
+
+} // namespace standin
