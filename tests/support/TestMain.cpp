@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 #include <wx/evtloop.h>
 #include <wx/init.h>
+#include <wx/log.h>
 
 namespace {
 
@@ -23,6 +24,14 @@ int main(int argc, char** argv)
     testing::InitGoogleTest(&argc, argv);
     if (GTEST_FLAG_GET(list_tests))
         return RUN_ALL_TESTS();
+
+    // Toolkit messages go to the test's output; a dialog would stall the run.
+    delete wxLog::SetActiveTarget(new wxLogStderr);
+    wxSetAssertHandler([](const wxString& file, int line, const wxString& func,
+                          const wxString& cond, const wxString& msg) {
+        ADD_FAILURE_AT(file.utf8_str(), line)
+            << "toolkit assertion in " << func << ": " << cond << " " << msg;
+    });
 
     wxApp::SetInstance(new TestApp);
     if (!wxEntryStart(argc, argv) || !wxTheApp->CallOnInit()) {
