@@ -26,7 +26,6 @@ int main(int argc, char** argv)
         return RUN_ALL_TESTS();
 
     // Toolkit messages go to the test's output; a dialog would stall the run.
-    delete wxLog::SetActiveTarget(new wxLogStderr);
     wxSetAssertHandler([](const wxString& file, int line, const wxString& func,
                           const wxString& cond, const wxString& msg) {
         ADD_FAILURE_AT(file.utf8_str(), line)
@@ -38,6 +37,8 @@ int main(int argc, char** argv)
         fprintf(stderr, "the toolkit could not start (is DISPLAY set?)\n");
         return 2;
     }
+    delete wxLog::SetActiveTarget(new wxLogStderr);
+    wxLog::DontCreateOnDemand();
     int result = 0;
     {
         wxEventLoop loop;

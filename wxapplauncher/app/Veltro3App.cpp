@@ -58,7 +58,9 @@ bool Veltro3App::OnInit()
     m_splashTimer = new wxTimer;
 
     const wxLanguage language = static_cast<wxLanguage>(wxLocale::GetSystemLanguage());
-    m_locale.Init(language, wxLOCALE_LOAD_DEFAULT);
+    // A locale that is not installed reads as unknown; the texts then stay English.
+    if (language != wxLANGUAGE_UNKNOWN)
+        m_locale.Init(language, wxLOCALE_LOAD_DEFAULT);
     PrepareTranslations(m_locale, language);
 
     const wxString launcherDir =
