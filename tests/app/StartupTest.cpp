@@ -1,9 +1,9 @@
 // Start-up and shutdown of the real launcher, run as its own process.
+#include "support/DesktopTools.h"
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
-#include "support/X11Client.h"
 #include "support/XvfbServer.h"
 
 #include <gtest/gtest.h>
@@ -81,14 +81,11 @@ TEST_F(StartupTest, FrameShowsAfterTheSplashTimeAndOpensTheFirstArgument)
 
 TEST_F(StartupTest, CloseBoxEndsTheLauncher)
 {
-    XvfbServer screen(1280, 1024);
-    ASSERT_FALSE(screen.Display().empty());
-    ProbeRun launcher(m_install.Path(), {}, Env(screen.Display()));
+    ProbeRun launcher(m_install.Path(), {}, Env());
     ASSERT_TRUE(launcher.WaitForShown());
-    X11Client x11(screen.Display());
-    XWindowId frame = 0;
-    ASSERT_TRUE(WaitFor([&] { return (frame = x11.FindByTitle("Veltrona")) != 0; }));
-    x11.RequestClose(frame);
+    unsigned long frame = 0;
+    ASSERT_TRUE(WaitFor([&] { return (frame = WindowOf(launcher.Pid(), "Veltrona")) != 0; }));
+    CloseWindow(frame);
     int status = 0;
     ASSERT_TRUE(launcher.WaitForExit(10000, status));
     EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);

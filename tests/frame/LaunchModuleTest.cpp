@@ -1,29 +1,33 @@
-// Module launching through the frame's menu, the view's buttons, the Inspect
-// drop target and OpenInInspect, observed from the stand-ins' start records.
+// Module launching through the File menu, the view's buttons, the Inspect drop
+// target and OpenInInspect, observed from the stand-ins' start records.
 #include "frame/DragNDrop.h"
 #include "frame/ModuleCatalog.h"
 #include "frame/Veltro3AppFrame.h"
 #include "frame/Veltro3MainAppStandardView.h"
 
+#include "support/DesktopTools.h"
 #include "support/DialogRecorder.h"
 #include "support/GuiWait.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
-#include "support/X11Client.h"
 
 #include <gtest/gtest.h>
-#include <wx/filename.h>
+#include <wx/filefn.h>
+#include <wx/utils.h>
 
-#include <cstdlib>
 #include <fstream>
 #include <memory>
 
 namespace {
 
+const std::string kPrinter = "Quenta Print Studio.exe";
+const std::string kVerify = "ZelVerifyStudio.exe";
 const std::vector<std::string> kAllModules = {
-    "Quenta Print Studio.exe", "Monitor/Zel Display Studio.exe", "Quenta Link Studio.exe",
-    "ZelVerifyStudio.exe",     "Quenta Inspect Studio.exe",      "Quenta Edit Studio.exe",
+    kPrinter, "Monitor/Zel Display Studio.exe", "Quenta Link Studio.exe",
+    kVerify,  "Quenta Inspect Studio.exe",      "Quenta Edit Studio.exe",
 };
+
+using Args = std::vector<std::string>;
 
 class LaunchModuleTest : public testing::Test
 {
@@ -43,7 +47,6 @@ protected:
     {
         if (m_frame)
             m_frame->Destroy();
-        wxSetWorkingDirectory("/");
     }
 
     std::string Exe(const std::string& name) const { return m_install->Path() + "/" + name; }
@@ -60,25 +63,18 @@ protected:
         m_frame->ProcessWindowEvent(command);
     }
 
-    std::vector<StandinRecord> WaitForStarts(size_t count)
-    {
-        return WaitForRecords(m_log, count, 10000);
-    }
-
-    // Starts Printer and waits for it: everything asked to start before it has
-    // been started by then.
+    // Starts Printer and waits for its record: what was asked to start before
+    // it has started by then. Returns the records before the Printer one.
     std::vector<StandinRecord> StartsBeforeSentinel()
     {
         const size_t before = ReadRecords(m_log).size();
         Click(1101);
         std::vector<StandinRecord> records;
-        WaitFor([&] {
+        EXPECT_TRUE(WaitFor([&] {
             records = ReadRecords(m_log);
-            return records.size() > before && records.back().exe == Exe("Quenta Print Studio.exe");
-        });
-        EXPECT_FALSE(records.empty());
-        if (!records.empty())
-            records.pop_back();
+            return records.size() > before && records.back().exe == Exe(kPrinter);
+        }));
+        records.pop_back();
         return records;
     }
 
@@ -88,19 +84,19 @@ protected:
     Veltro3MainAppStandardView* m_view = nullptr;
 };
 
-TEST_F(LaunchModuleTest, ButtonAndMenuStartTheSameCommandLine)
+TEST_F(LaunchModuleTest, ButtonAndMenuStartTheSameProgramWithTheSameArguments)
 {
     Install(kAllModules);
     const struct
     {
         int button, menu;
         std::string exe;
-        std::vector<std::string> args;
+        Args args;
     } cases[] = {
-        {1101, 1001, "Quenta Print Studio.exe", {}},
+        {1101, 1001, kPrinter, {}},
         {1100, 1002, "Monitor/Zel Display Studio.exe", {}},
         {1102, 1003, "Quenta Link Studio.exe", {}},
-        {1105, 1004, "ZelVerifyStudio.exe", {"VLT", std::to_string(GetModuleLanguageId())}},
+        {1105, 1004, kVerify, {"VLT", std::to_string(GetModuleLanguageId())}},
         {1104, 1005, "Quenta Inspect Studio.exe", {}},
         {1103, 1006, "Quenta Edit Studio.exe", {}},
     };
@@ -109,7 +105,7 @@ TEST_F(LaunchModuleTest, ButtonAndMenuStartTheSameCommandLine)
         Click(c.button);
         Menu(c.menu);
         expected += 2;
-        const auto records = WaitForStarts(expected);
+        const auto records = WaitForRecords(m_log, expected);
         ASSERT_EQ(records.size(), expected) << c.exe;
         for (size_t i = expected - 2; i < expected; ++i) {
             EXPECT_EQ(records[i].exe, Exe(c.exe));
@@ -123,32 +119,26 @@ TEST_F(LaunchModuleTest, FileReachesInspectAsOneArgument)
 {
     Install(kAllModules);
     const std::string awkward = m_install->Path() + "/dir with blanks/a \"b\" c.icc";
-    const std::string second = m_install->Path() + "/second.icc";
-
     m_frame->OpenInInspect(wxString::FromUTF8(awkward));
-    DragNDrop drop(m_view, 1005);
+
     wxArrayString dropped;
-    dropped.Add(wxString::FromUTF8(second));
-    dropped.Add("/tmp/third.icc");
-    dropped.Add("/tmp/fourth.icc");
-    EXPECT_TRUE(drop.OnDropFiles(0, 0, dropped));
+    for (const char* name : {"/tmp/first.icc", "/tmp/second.icc", "/tmp/third.icc"})
+        dropped.Add(name);
+    EXPECT_TRUE(DragNDrop(m_view, 1005).OnDropFiles(0, 0, dropped));
 
-    const auto records = WaitForStarts(2);
-    ASSERT_EQ(records.size(), 2u);
-    EXPECT_EQ(records[0].args, std::vector<std::string>{awkward});
-    EXPECT_EQ(records[1].args, std::vector<std::string>{second});
-    EXPECT_TRUE(StartsBeforeSentinel().size() == 2) << "a drop starts Inspect once";
+    const auto records = StartsBeforeSentinel();
+    ASSERT_EQ(records.size(), 2u) << "one start per opened file";
+    EXPECT_EQ(records[0].args, Args{awkward});
+    EXPECT_EQ(records[1].args, Args{"/tmp/first.icc"});
 
-    // What the launcher shows as the command line keeps the plain quoting.
-    const ModuleCommand command =
-        BuildModuleCommand(*FindModule(1005), "/opt/suite/", wxString::FromUTF8(awkward));
-    EXPECT_EQ(command.CommandLine(),
-              "\"/opt/suite/Quenta Inspect Studio.exe\" \"" + wxString::FromUTF8(awkward) + "\"");
+    // The command line shown for it keeps the plain quoting.
+    const ModuleCommand command = BuildModuleCommand(*FindModule(1005), "/opt/suite/", "a b.icc");
+    EXPECT_EQ(command.CommandLine(), "\"/opt/suite/Quenta Inspect Studio.exe\" \"a b.icc\"");
 }
 
 TEST_F(LaunchModuleTest, NothingStartsAndNothingShowsWhenThereIsNothingToStart)
 {
-    Install({"Quenta Print Studio.exe"});
+    Install({kPrinter});
     DialogRecorder dialogs;
     m_view->LaunchModule(999, wxString());
     m_view->LaunchModule(1000, wxString());
@@ -196,53 +186,47 @@ TEST_F(LaunchModuleTest, VerifyGetsTheWindowsLanguageNumber)
     wxLocale british;
     british.Init(wxLANGUAGE_ENGLISH_UK, wxLOCALE_DONT_LOAD_DEFAULT);
     Click(1105);
-    const auto records = WaitForStarts(1);
+    const auto records = WaitForRecords(m_log, 1);
     ASSERT_EQ(records.size(), 1u);
-    EXPECT_EQ(records[0].args, (std::vector<std::string>{"VLT", "2057"}));
+    EXPECT_EQ(records[0].args, (Args{"VLT", "2057"}));
 }
 
 TEST_F(LaunchModuleTest, RunningVerifyIsBroughtForwardInsteadOfStarted)
 {
     Install(kAllModules);
-    StandinDir verifyInstall({"ZelVerifyStudio.exe"});
-    const std::string ready = verifyInstall.Path() + "/ready";
-    const std::string verifyLog = verifyInstall.Path() + "/verify.log";
+    StandinDir other({kVerify});
+    const std::string ready = other.Path() + "/ready";
     wxExecuteEnv env;
     wxGetEnvMap(&env.env);
+    env.env.erase("VELTRONA_STANDIN_LOG");
     env.env["VELTRONA_STANDIN_EXIT"] = "0";
     env.env["VELTRONA_STANDIN_READY"] = ready;
-    env.env["VELTRONA_STANDIN_LOG"] = verifyLog;
-    const wxString verifyExe = verifyInstall.Path() + "/ZelVerifyStudio.exe";
-    const wchar_t* argv[] = {verifyExe.wc_str(), nullptr};
+    const wxString exe = other.Path() + "/" + kVerify;
+    const wchar_t* argv[] = {exe.wc_str(), nullptr};
     const long pid = wxExecute(argv, wxEXEC_ASYNC, nullptr, &env);
     ASSERT_GT(pid, 0);
     ASSERT_TRUE(WaitFor([&] { return wxFileExists(ready); }));
-    std::ifstream readyFile(ready);
     unsigned long verifyWindow = 0;
-    readyFile >> verifyWindow;
+    std::ifstream(ready) >> verifyWindow;
 
-    // Another window has the focus when Verify is pressed.
+    auto activateLauncher = [&] {
+        return WaitFor([&] {
+            m_frame->Raise();
+            return ActiveWindow() != 0 && ActiveWindow() != verifyWindow;
+        });
+    };
     m_frame->Show();
-    X11Client x11;
-    ASSERT_TRUE(WaitFor([&] {
-        m_frame->Raise();
-        return x11.ActiveWindow() != 0 && x11.ActiveWindow() != verifyWindow;
-    }));
-
+    ASSERT_TRUE(activateLauncher());
     Menu(1004);
-    EXPECT_TRUE(WaitFor([&] { return x11.ActiveWindow() == verifyWindow; }));
+    EXPECT_TRUE(WaitFor([&] { return ActiveWindow() == verifyWindow; }));
     EXPECT_TRUE(StartsBeforeSentinel().empty());
 
     // Without the Verify executable nothing happens, not even the raise.
-    wxRemoveFile(Exe("ZelVerifyStudio.exe"));
-    ASSERT_TRUE(WaitFor([&] {
-        m_frame->Raise();
-        return x11.ActiveWindow() != verifyWindow;
-    }));
+    wxRemoveFile(Exe(kVerify));
+    ASSERT_TRUE(activateLauncher());
     Click(1105);
-    EXPECT_TRUE(StartsBeforeSentinel().size() == 1); // the earlier sentinel only
-    EXPECT_NE(x11.ActiveWindow(), verifyWindow);
-
+    EXPECT_EQ(StartsBeforeSentinel().size(), 1u); // the earlier sentinel only
+    EXPECT_NE(ActiveWindow(), verifyWindow);
     wxKill(pid, wxSIGKILL);
 }
 

@@ -1,203 +1,160 @@
 // The instrument client against the simulator library: callback registration,
-// notifications turned into events on the GUI thread, measurements with their
-// option steps, and destruction that waits for the client's workers.
-#include "instrument/VaroEventRecorder.h"
-#include "instrument/VaroFunctions.h"
-#include "instrument/VaroSimControl.h"
+// notifications turned into events for the GUI thread, measurements, and
+// destruction that waits for the client's workers.
+#include "instrument/SimControl.h"
+#include "instrument/VaroEvents.h"
 #include "instrument/Varo_client.h"
-
-#include "support/GuiWait.h"
 
 #include <gtest/gtest.h>
 #include <wx/app.h>
+#include <wx/eventfilter.h>
+#include <wx/thread.h>
 
 #include <chrono>
+#include <deque>
 #include <memory>
+#include <set>
+#include <string>
 
 namespace {
 
-class VaroClientTest : public testing::Test
+using Events = std::multiset<std::string>;
+
+template <typename Event, typename Field>
+std::string Describe(const wxEvent& event, const char* name, Field Event::*field)
 {
-protected:
-    void SetUp() override
+    const Event* typed = dynamic_cast<const Event*>(&event);
+    return typed ? name + (" " + std::to_string(typed->*field)) : "wrong class";
+}
+
+// Writes down each instrument event delivered, as "connected 1", "button 1" or
+// "measured 7", marking one that did not arrive as posted: on the GUI thread,
+// from the application, with id 0 and full propagation.
+struct Recorder : wxEventFilter
+{
+    Recorder() { wxEvtHandler::AddFilter(this); }
+    ~Recorder() override { wxEvtHandler::RemoveFilter(this); }
+
+    int FilterEvent(wxEvent& event) override
     {
-        ASSERT_TRUE(m_sim.IsOpen());
-        wxTheApp->SetActive(true, nullptr);
+        const wxEventType type = event.GetEventType();
+        std::string what;
+        if (type == zelEVT_Varo_CONNECTION)
+            what = Describe(event, "connected", &zelVaroConnectionEvent::m_connected);
+        else if (type == zelEVT_Varo_BUTTON)
+            what = Describe(event, "button", &zelVaroButtonEvent::m_pressed);
+        else if (type == zelEVT_Varo_MEAS)
+            what = Describe(event, "measured", &zelVaroMeasEvent::m_status);
+        else
+            return Event_Skip;
+        const int level = event.StopPropagation();
+        event.ResumePropagation(level);
+        if (!wxThread::IsMain() || event.GetEventObject() != wxTheApp || event.GetId() != 0 ||
+            level != wxEVENT_PROPAGATE_MAX)
+            what += " not as posted";
+        events.insert(what);
+        return Event_Skip;
     }
 
-    // Lets every fired notification reach the client, destroys the client
-    // (which waits for its workers) and delivers what they posted.
-    void Finish(std::unique_ptr<Varo_client>& client)
-    {
-        EXPECT_TRUE(m_sim.WaitIdle());
-        client.reset();
-        wxTheApp->ProcessPendingEvents();
-    }
-
-    bool WaitForMeasurements(size_t count)
-    {
-        return WaitFor([&] { return m_events.Count(zelEVT_Varo_MEAS) >= count; });
-    }
-
-    VaroSimControl m_sim;
-    VaroEventRecorder m_events;
+    Events events; // unordered: each notification has a worker of its own
 };
 
-TEST_F(VaroClientTest, OnlyTheFirstClientOfAProcessRegistersTheCallback)
+// Lets every fired notification reach the client, destroys the client (which
+// waits for its workers) and delivers what they posted.
+void Finish(std::unique_ptr<Varo_client>& client)
 {
-    EXPECT_FALSE(Varo_client::s_callbackRegistered);
-    auto first = std::make_unique<Varo_client>();
-    EXPECT_TRUE(Varo_client::s_callbackRegistered);
-    EXPECT_EQ(m_sim.Calls("VaroRegisterCallback"), 1);
-    {
-        Varo_client second;
-        Varo_client third;
-        EXPECT_EQ(Varo_client::s_clients.size(), 3u);
-    }
-    first.reset();
-    EXPECT_TRUE(Varo_client::s_clients.empty());
-
-    // A later client is reached through the registration made by the first.
-    auto later = std::make_unique<Varo_client>();
-    EXPECT_EQ(m_sim.Calls("VaroRegisterCallback"), 1);
-    m_sim.Fire(1000);
-    Finish(later);
-    EXPECT_EQ(m_events.Count(zelEVT_Varo_CONNECTION), 1u);
+    EXPECT_EQ(SIM(varosim_wait_idle)(10000), 0);
+    client.reset();
+    wxTheApp->ProcessPendingEvents();
 }
 
-TEST_F(VaroClientTest, ConnectionCodesBecomeEventsAndOtherCodesNothing)
+TEST(VaroClient, OnlyTheFirstClientRegistersAndEveryLiveClientIsNotified)
 {
-    auto client = std::make_unique<Varo_client>();
-    m_sim.Fire(1000);
-    m_sim.Fire(1);
-    m_sim.Fire(2);
-    m_sim.Fire(999);
-    Finish(client);
-
-    // Each notification has its own worker, so their events may arrive in any order.
-    const auto connections = m_events.Of(zelEVT_Varo_CONNECTION);
-    ASSERT_EQ(connections.size(), 2u);
-    EXPECT_NE(connections[0].flag, connections[1].flag);
-    EXPECT_EQ(m_events.Events().size(), 2u);
-    EXPECT_TRUE(m_events.AllDeliveredAsPosted());
-}
-
-TEST_F(VaroClientTest, EveryLiveClientGetsEachNotification)
-{
+    Recorder recorder;
     auto first = std::make_unique<Varo_client>();
     auto second = std::make_unique<Varo_client>();
-    m_sim.Fire(1);
-    EXPECT_TRUE(m_sim.WaitIdle());
-    second.reset();
-    m_sim.Fire(1);
+    SIM(varosim_fire)(1000, 0);
+    Finish(second);
     Finish(first);
-    EXPECT_EQ(m_events.Count(zelEVT_Varo_CONNECTION), 3u);
+    // A later client is reached through the first one's registration.
+    auto later = std::make_unique<Varo_client>();
+    SIM(varosim_fire)(1000, 0);
+    Finish(later);
+    EXPECT_EQ(SIM(varosim_calls)("VaroRegisterCallback"), 1);
+    EXPECT_EQ(recorder.events, (Events{"connected 1", "connected 1", "connected 1"}));
 }
 
-TEST_F(VaroClientTest, ButtonWhileAnotherProgramIsActiveMeasuresNothing)
+TEST(VaroClient, ConnectionCodesBecomeEventsOtherCodesNothing)
+{
+    Recorder recorder;
+    auto client = std::make_unique<Varo_client>();
+    for (const int code : {1000, 1, 2, 999})
+        SIM(varosim_fire)(code, 0);
+    Finish(client);
+    EXPECT_EQ(recorder.events, (Events{"connected 0", "connected 1"}));
+}
+
+TEST(VaroClient, ButtonWhileAnotherProgramIsActiveMeasuresNothing)
 {
     wxTheApp->SetActive(false, nullptr);
+    Recorder recorder;
     auto client = std::make_unique<Varo_client>();
-    m_sim.Fire(0);
+    SIM(varosim_fire)(0, 0);
     Finish(client);
-
-    const auto buttons = m_events.Of(zelEVT_Varo_BUTTON);
-    ASSERT_EQ(buttons.size(), 1u);
-    EXPECT_TRUE(buttons[0].flag);
-    EXPECT_EQ(m_events.Count(zelEVT_Varo_MEAS), 0u);
-    EXPECT_EQ(m_sim.Calls("VaroMeasure"), 0);
-    EXPECT_EQ(m_sim.OptionLog(), "");
-    EXPECT_TRUE(m_events.AllDeliveredAsPosted());
+    EXPECT_EQ(recorder.events, Events{"button 1"});
+    EXPECT_EQ(SIM(varosim_calls)("VaroMeasure"), 0);
+    EXPECT_EQ(SIM(varosim_option_log)(nullptr, 0), 0u);
 }
 
-TEST_F(VaroClientTest, ButtonWhileActiveMeasuresWithTheBeepOff)
+// The client goes as soon as the press reached it: its destruction waits for
+// the measurement and for the half-second busy timer that follows it.
+TEST(VaroClient, ButtonWhileActiveMeasuresWithTheBeepOff)
 {
+    wxTheApp->SetActive(true, nullptr);
+    Recorder recorder;
     for (const int result : {0, 7}) {
-        m_sim.SetMeasureResult(result);
+        SIM(varosim_set_measure_result)(result);
+        const auto pressed = std::chrono::steady_clock::now();
         auto client = std::make_unique<Varo_client>();
-        m_sim.Fire(0);
-        ASSERT_TRUE(WaitForMeasurements(result == 0 ? 1 : 2));
+        SIM(varosim_fire)(0, 0);
         Finish(client);
-        EXPECT_EQ(m_events.Of(zelEVT_Varo_MEAS).back().status, result);
+        const auto waited = std::chrono::steady_clock::now() - pressed;
+        EXPECT_GE(std::chrono::duration_cast<std::chrono::milliseconds>(waited).count(), 500);
     }
-    EXPECT_EQ(m_events.Count(zelEVT_Varo_BUTTON), 2u);
-    EXPECT_EQ(m_sim.Calls("VaroMeasure"), 2);
-    // "Beep" is the one option: set before each measurement, never read or restored.
-    EXPECT_EQ(m_sim.OptionLog(), "Beep=no\nBeep=no\n");
-    EXPECT_EQ(m_sim.Calls("VaroGetOption"), 0);
-    EXPECT_TRUE(m_events.AllDeliveredAsPosted());
+    EXPECT_EQ(recorder.events, (Events{"button 1", "button 1", "measured 0", "measured 7"}));
+    EXPECT_EQ(SIM(varosim_calls)("VaroMeasure"), 2);
+    // Set before each measurement, never read back nor restored.
+    char options[64];
+    SIM(varosim_option_log)(options, sizeof options);
+    EXPECT_STREQ(options, "Beep=no\nBeep=no\n");
 }
 
-TEST_F(VaroClientTest, DestroyingRightAfterAMeasurementWaitsForTheTimerWorker)
+// Also run under ThreadSanitizer, which reports any unguarded shared access
+// and any use of a destroyed client.
+TEST(VaroClient, ClientsComeAndGoWhileTheLibraryNotifies)
 {
-    const auto pressed = std::chrono::steady_clock::now();
-    auto client = std::make_unique<Varo_client>();
-    m_sim.Fire(0);
-    ASSERT_TRUE(WaitForMeasurements(1));
-    client.reset();
-    // The timer worker sleeps half a second from the measurement, which came after the press.
-    EXPECT_GE(std::chrono::steady_clock::now() - pressed, std::chrono::milliseconds(500));
-}
-
-TEST_F(VaroClientTest, ButtonIsIgnoredWhileAMeasurementRunsAndJustAfter)
-{
-    m_sim.SetMeasureDelay(1000);
-    auto client = std::make_unique<Varo_client>();
-    m_sim.Fire(0);
-    ASSERT_TRUE(WaitFor([&] { return m_sim.Calls("VaroMeasure") == 1; }));
-    m_sim.Fire(0);
-    ASSERT_TRUE(WaitForMeasurements(1));
-    m_sim.Fire(0);
-    Finish(client);
-
-    EXPECT_EQ(m_sim.Calls("VaroMeasure"), 1);
-    EXPECT_EQ(m_events.Count(zelEVT_Varo_BUTTON), 1u);
-    EXPECT_EQ(m_events.Count(zelEVT_Varo_MEAS), 1u);
-}
-
-TEST_F(VaroClientTest, MeasureRefusesAtOnceWhileBusy)
-{
-    Varo_client client;
-    m_sim.SetMeasureResult(3);
-    EXPECT_EQ(client.Measure(), 3);
-    EXPECT_EQ(client.Measure(), -1);
-    EXPECT_EQ(m_sim.Calls("VaroMeasure"), 1);
-}
-
-TEST_F(VaroClientTest, SavedOptionsAreReadAsUtf8AndRestoredByTheirRules)
-{
-    VaroFunctions::Get()->setOption("Illumination", "Grün");
-    Varo_client client;
-    client.m_settings["Beep"] = "no";
-    client.m_settings["Recognition"] = "yes";
-    client.m_settings["Illumination"] = "D50";
-    client.SaveSettings();
-    ASSERT_EQ(client.m_savedSettings.size(), 1u);
-    EXPECT_EQ(client.m_savedSettings["Illumination"], wxString::FromUTF8("Grün"));
-    EXPECT_EQ(m_sim.Calls("VaroGetOption"), 1);
-
-    client.m_savedSettings.clear();
-    client.m_savedSettings["Beep"] = "loud";
-    client.m_savedSettings["Recognition"] = "yes";
-    client.m_savedSettings["Mode"] = "SingleEmission";
-    client.m_savedSettings["Filter"] = "no";
-    client.m_savedSettings["Speed"] = "fast";
-    const std::string before = m_sim.OptionLog();
-    client.RestoreSettings();
-    EXPECT_EQ(m_sim.OptionLog().substr(before.size()), "Filter=no\nRecognition=yes\nSpeed=fast\n");
-}
-
-TEST_F(VaroClientTest, ChecksAnswerFromTheLibrary)
-{
-    Varo_client client;
-    m_sim.SetState(VAROSIM_NONE);
-    EXPECT_NE(client.CheckInstrument(), 0);
-    m_sim.SetState(VAROSIM_DIRECT);
-    EXPECT_EQ(client.CheckInstrument(), 0);
-    EXPECT_NE(client.CheckTableMount(), 0);
-    m_sim.SetState(VAROSIM_TABLE);
-    EXPECT_EQ(client.CheckInstrument(), 0);
-    EXPECT_EQ(client.CheckTableMount(), 0);
+    Recorder recorder;
+    std::deque<std::unique_ptr<Varo_client>> clients;
+    for (int round = 0; round < 120; ++round) {
+        // A measurement keeps its client half a second, so only some presses measure.
+        wxTheApp->SetActive(round % 15 == 0, nullptr);
+        clients.push_back(std::make_unique<Varo_client>());
+        for (const int code : {1000, 1, 2, 0})
+            SIM(varosim_fire)(code, round);
+        if (clients.size() > 3 || round % 4 == 0)
+            clients.pop_front();
+        if (round % 10 == 0)
+            wxTheApp->ProcessPendingEvents();
+    }
+    EXPECT_EQ(SIM(varosim_wait_idle)(10000), 0);
+    clients.clear();
+    wxTheApp->ProcessPendingEvents();
+    EXPECT_TRUE(Varo_client::s_clients.empty());
+    EXPECT_GT(recorder.events.count("button 1"), 0u);
+    for (const std::string& event : recorder.events)
+        EXPECT_TRUE(event == "connected 0" || event == "connected 1" || event == "button 1" ||
+                    event == "measured 0")
+            << event;
 }
 
 } // namespace

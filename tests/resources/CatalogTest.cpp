@@ -1,168 +1,159 @@
-// Catalogue resources: their memory names, what start-up copies, damaged catalogues,
-// and that every catalogue holds every text the launcher translates.
+// Catalogue resources: their memory names, which of them start-up copies, that each
+// translates every text of the sources, and the frame's menus in each language.
+#include "frame/Veltro3AppFrame.h"
 #include "platform/ResourceImage.h"
 #include "resources/CatalogFormat.h"
 #include "resources/Catalogs.h"
-#include "resources/ResourceTestKit.h"
 
 #include <gtest/gtest.h>
-#include <wx/filesys.h>
-#include <wx/fs_mem.h>
-#include <wx/log.h>
 
 #include <cstdio>
+#include <wx/filesys.h>
+#include <wx/fs_mem.h>
+#include <wx/menu.h>
+
+#include <algorithm>
+#include <cstring>
+#include <fstream>
+#include <map>
 #include <memory>
-#include <set>
-#include <sstream>
+
+using Bytes = std::vector<unsigned char>;
 
 namespace {
 
-const char* const languages[] = {"DE", "EN", "ES", "FR", "IT", "JA", "NL", "PT", "ZH_CN"};
-
-bool MemoryFileExists(const wxString& name)
+Bytes Catalogue(const std::string& name)
 {
-    wxFileSystem fs;
-    return std::unique_ptr<wxFSFile>(fs.OpenFile("memory:" + name)) != nullptr;
+    const ResourceEntry* entry = ResourceImage::OfExecutable().Find(ResourceTypeRcData, name);
+    return entry ? Bytes(entry->data, entry->data + entry->size) : Bytes();
 }
 
-void UseMemoryFileSystem()
+void AddLabels(const wxMenu* menu, std::vector<std::string>& labels)
 {
-    static bool added = false;
-    if (!added)
-        wxFileSystem::AddHandler(new wxMemoryFSHandler);
-    added = true;
+    for (const wxMenuItem* item : menu->GetMenuItems()) {
+        labels.push_back(item->GetItemLabel().utf8_string());
+        if (item->GetSubMenu())
+            AddLabels(item->GetSubMenu(), labels);
+    }
 }
 
-// The msgids that xgettext finds in the launcher's sources.
-std::set<std::string> TranslatedTextsOfSources()
+// The labels of a new frame's menus and of all their items, in order.
+std::vector<std::string> MenuLabels()
 {
-    const std::string pot = testing::TempDir() + "veltrona-sources.pot";
-    const std::string command = std::string("cd '") + VELTRONA_SOURCE_DIR +
-                                "' && find wxapplauncher -name '*.cpp' -o -name '*.h' | sort | "
-                                "xgettext --from-code=UTF-8 --language=C++ --keyword=_ "
-                                "--keyword=wxTRANSLATE --keyword=wxGetTranslation "
-                                "--omit-header -f - -o '" +
-                                pot + "'";
-    EXPECT_EQ(std::system(command.c_str()), 0) << command;
-    const std::string mo = pot + ".mo";
-    // msgfmt turns the extracted escapes into the bytes a catalogue keys on.
-    const std::string compile = "msgen '" + pot + "' | msgfmt -o '" + mo + "' -";
-    std::set<std::string> keys;
-    if (std::system(compile.c_str()) != 0)
-        return keys;
-    const std::vector<unsigned char> bytes = ReadWholeFile(mo);
-    for (const auto& entry : ReadCatalog(bytes.data(), bytes.size()))
-        keys.insert(entry.first);
-    std::remove(pot.c_str());
-    std::remove(mo.c_str());
-    return keys;
+    Veltro3AppFrame* frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
+    std::vector<std::string> labels;
+    for (size_t i = 0; i < frame->GetMenuBar()->GetMenuCount(); ++i) {
+        labels.push_back(frame->GetMenuBar()->GetMenuLabel(i).utf8_string());
+        AddLabels(frame->GetMenuBar()->GetMenu(i), labels);
+    }
+    frame->Destroy();
+    return labels;
 }
+
+// Original to translated text of a catalogue (little-endian, as is the host).
+std::map<std::string, std::string> ReadCatalog(const Bytes& mo)
+{
+    auto at = [&](std::size_t offset) {
+        std::uint32_t value;
+        std::memcpy(&value, &mo[offset], 4);
+        return value;
+    };
+    auto text = [&](std::size_t entry) {
+        return std::string(reinterpret_cast<const char*>(&mo[at(entry + 4)]), at(entry));
+    };
+    std::map<std::string, std::string> texts;
+    for (std::uint32_t i = 0; !mo.empty() && i < at(8); ++i)
+        texts[text(at(12) + i * 8)] = text(at(16) + i * 8);
+    texts.erase(""); // the header
+    return texts;
+}
+
+using MenusInLanguage = testing::TestWithParam<std::string>;
 
 } // namespace
 
 TEST(Catalogs, MemoryNamesFollowTheLanguageFolderRules)
 {
-    const std::pair<const char*, const char*> cases[] = {
-        {"DE/VELTRO.MO", "./de/Veltro.mo"},
-        {"ZH_CN/VELTRO.MO", "./zh_CN/Veltro.mo"},
-        {"PT_BR/VELTRO.MO", "./pt_BR/Veltro.mo"},
-        {"JA/SUB/VELTRO.MO", "./ja/SUB/Veltro.mo"},
-        {"DE/OTHER.MO", ""},
-        {"DE/VELTRO.MOVELTRO.MO", ""},
-        {"/VELTRO.MO", ""},
-        {"VELTRO.MO", ""},
-        {"DE/veltro.mo", ""},
-        {"_X/VELTRO.MO", "./_x/Veltro.mo"},
-    };
-    for (const auto& c : cases)
-        EXPECT_EQ(CatalogMemoryName(c.first), wxString(c.second)) << c.first;
+    EXPECT_EQ(CatalogMemoryName("ZH_CN/VELTRO.MO"), "./zh_CN/Veltro.mo");
+    EXPECT_EQ(CatalogMemoryName("JA/SUB/VELTRO.MO"), "./ja/SUB/Veltro.mo");
+    for (const char* name : {"DE/OTHER.MO", "DE/VELTRO.MOVELTRO.MO", "/VELTRO.MO", "VELTRO.MO"})
+        EXPECT_EQ(CatalogMemoryName(name), "") << name;
 }
 
-TEST(Catalogs, StartupCopiesTheNineCataloguesUnderLanguageFolders)
+TEST(Catalogs, OnlyWellFormedCatalogueResourcesAreCopied)
 {
-    UseMemoryFileSystem();
-    LoadCatalogResources();
-    for (const char* lang : {"de", "en", "es", "fr", "it", "ja", "nl", "pt", "zh_CN"})
-        EXPECT_TRUE(MemoryFileExists(wxString("./") + lang + "/Veltro.mo")) << lang;
-    EXPECT_FALSE(MemoryFileExists("./ZH_CN/Veltro.mo"));
-    EXPECT_FALSE(MemoryFileExists("./zh/Veltro.mo"));
-}
-
-TEST(Catalogs, MisnamedMissingOrDamagedResourcesAreNotCopied)
-{
-    UseMemoryFileSystem();
-    const std::vector<unsigned char> good = EmbeddedCatalog("DE/VELTRO.MO");
-    ASSERT_FALSE(good.empty());
-    std::vector<unsigned char> damaged = good;
-    damaged[12] = 0xF0; // the table of originals now lies far outside
-    const std::vector<unsigned char> cut(good.begin(), good.begin() + long(good.size() / 2));
-    ResBuilder res;
-    res.Add(ResourceTypeRcData, "KA/OTHER.MO", good)
-        .Add(ResourceTypeRcData, "KB/VELTRO.MOVELTRO.MO", good)
-        .Add(ResourceTypeRcData, "/VELTRO.MO", good)
-        .Add(ResourceTypeRcData, "KC/VELTRO.MO", damaged)
-        .Add(ResourceTypeRcData, "KD/VELTRO.MO", cut)
-        .Add(ResourceTypeIcon, "KE/VELTRO.MO", good)
-        .Add(ResourceTypeRcData, "KF_XY/VELTRO.MO", good);
-    const ResourceImage image(res.Bytes());
-    LoadCatalogResources(image);
-    EXPECT_TRUE(MemoryFileExists("./kf_XY/Veltro.mo"));
-    for (const char* name : {"./ka/OTHER.MO", "./kb/Veltro.moVeltro.mo", "./kb/Veltro.moVELTRO.MO",
-                             ".//Veltro.mo", "./kc/Veltro.mo", "./kd/Veltro.mo", "./ke/Veltro.mo"})
-        EXPECT_FALSE(MemoryFileExists(name)) << name;
-    EXPECT_TRUE(LoadCatalogResource(image, "NOT/THERE.MO"));
-    EXPECT_TRUE(LoadCatalogResource(image, "NO/VELTRO.MO"));
-    EXPECT_FALSE(MemoryFileExists("./no/Veltro.mo"));
-}
-
-TEST(Catalogs, FormatCheckRejectsEveryTruncationAndStrayOffset)
-{
-    const std::vector<unsigned char> mo = EmbeddedCatalog("JA/VELTRO.MO");
-    ASSERT_TRUE(IsWellFormedCatalog(mo.data(), mo.size()));
-    for (std::size_t length = 0; length < mo.size(); ++length)
-        ASSERT_FALSE(IsWellFormedCatalog(mo.data(), length)) << length;
-    // A string offset past the end, and a string that loses its terminator.
-    std::vector<unsigned char> stray = mo;
-    const std::size_t translations = stray[16] | stray[17] << 8;
-    stray[translations + 7] = 0x7F;
-    EXPECT_FALSE(IsWellFormedCatalog(stray.data(), stray.size()));
-    std::vector<unsigned char> unterminated = mo;
-    unterminated.back() = 'x';
-    EXPECT_FALSE(IsWellFormedCatalog(unterminated.data(), unterminated.size()));
-    EXPECT_FALSE(IsWellFormedCatalog(nullptr, 0));
+    const Bytes ja = Catalogue("JA/VELTRO.MO");
+    ASSERT_TRUE(IsWellFormedCatalog(ja.data(), ja.size()));
+    for (std::size_t length = 0; length < ja.size(); ++length)
+        ASSERT_FALSE(IsWellFormedCatalog(ja.data(), length)) << length;
+    // In a copy of the executable's resources, the Japanese catalogue's last text loses its end.
+    Bytes image;
+    ASSERT_TRUE(ReadElfSectionOfFile("/proc/self/exe", ".rsrc", image));
+    const auto at = std::search(image.begin(), image.end(), ja.begin(), ja.end());
+    ASSERT_NE(at, image.end());
+    at[ja.size() - 1] = 'x';
+    wxFileSystem::AddHandler(new wxMemoryFSHandler);
+    LoadCatalogResources(ResourceImage(image));
+    wxFileSystem fs;
+    EXPECT_FALSE(std::unique_ptr<wxFSFile>(fs.OpenFile("memory:./ja/Veltro.mo")));
+    EXPECT_TRUE(std::unique_ptr<wxFSFile>(fs.OpenFile("memory:./zh_CN/Veltro.mo")));
 }
 
 TEST(Catalogs, EveryCatalogueTranslatesEveryTextOfTheSources)
 {
-    const std::set<std::string> keys = TranslatedTextsOfSources();
-    ASSERT_FALSE(keys.empty());
-    ASSERT_TRUE(keys.count("&File")) << "xgettext found no menu texts";
-    for (const char* lang : languages) {
-        const std::vector<unsigned char> mo = EmbeddedCatalog(std::string(lang) + "/VELTRO.MO");
-        const auto texts = ReadCatalog(mo.data(), mo.size());
-        for (const std::string& key : keys) {
-            const auto found = texts.find(key);
-            EXPECT_TRUE(found != texts.end() && !found->second.empty())
-                << lang << " lacks \"" << key << "\"";
-        }
+    const std::string pot = testing::TempDir() + "veltrona.pot", mo = pot + ".mo";
+    const std::string extract = "cd '" VELTRONA_SOURCE_DIR "' && find wxapplauncher -name '*.cpp' "
+                                "-o -name '*.h' | xgettext --from-code=UTF-8 -C -k_ "
+                                "-kwxTRANSLATE -kwxGetTranslation -f - -o '" +
+                                pot + "' && grep -q '^msgid \"&File\"' '" + pot + "'";
+    ASSERT_EQ(std::system(extract.c_str()), 0) << "xgettext found no menu texts";
+    for (const char* lang : {"DE", "EN", "ES", "FR", "IT", "JA", "NL", "PT", "ZH_CN"}) {
+        const Bytes bytes = Catalogue(std::string(lang) + "/VELTRO.MO");
+        std::ofstream(mo).write(reinterpret_cast<const char*>(bytes.data()), long(bytes.size()));
+        const std::string compare = "msgunfmt '" + mo + "' | msgcmp - '" + pot + "'";
+        EXPECT_EQ(std::system(compare.c_str()), 0) << lang << " lacks texts of the sources";
     }
+    std::remove(pot.c_str());
+    std::remove(mo.c_str());
 }
 
-TEST(Catalogs, EnglishMapsKeysToThemselvesAndOthersHoldTheSameKeys)
+TEST_P(MenusInLanguage, FileAndHelpMenusAreTranslated)
 {
-    const std::vector<unsigned char> en = EmbeddedCatalog("EN/VELTRO.MO");
-    const auto english = ReadCatalog(en.data(), en.size());
-    ASSERT_GT(english.size(), 40u);
-    std::set<std::string> keys;
-    for (const auto& entry : english) {
-        EXPECT_EQ(entry.first, entry.second);
-        keys.insert(entry.first);
+    const std::vector<std::string> english = MenuLabels();
+    for (const char* name : {"LANGUAGE", "LC_ALL", "LC_MESSAGES"})
+        unsetenv(name);
+    setenv("LANG", (GetParam().substr(0, 5) + ".UTF-8").c_str(), 1);
+    // Start-up's steps.
+    wxLocale locale;
+    const wxLanguage language = wxLanguage(wxLocale::GetSystemLanguage());
+    if (language != wxLANGUAGE_UNKNOWN)
+        locale.Init(language, wxLOCALE_LOAD_DEFAULT);
+    PrepareTranslations(locale, language);
+    wxFileSystem::AddHandler(new wxMemoryFSHandler);
+    LoadCatalogResources();
+    wxLocale::AddCatalogLookupPathPrefix("memory:.");
+    locale.AddCatalog("Veltro");
+
+    const bool hasCatalogue = GetParam().size() > 5;
+    const auto texts =
+        ReadCatalog(Catalogue(hasCatalogue ? GetParam().substr(6) + "/VELTRO.MO" : ""));
+    ASSERT_EQ(texts.empty(), !hasCatalogue);
+    const std::vector<std::string> shown = MenuLabels();
+    ASSERT_EQ(shown.size(), english.size());
+    size_t translated = 0;
+    for (size_t i = 0; i < english.size(); ++i) {
+        const auto want = texts.find(english[i]);
+        EXPECT_EQ(shown[i], want != texts.end() ? want->second : english[i]);
+        translated += shown[i] != english[i];
     }
-    for (const char* lang : languages) {
-        const std::vector<unsigned char> mo = EmbeddedCatalog(std::string(lang) + "/VELTRO.MO");
-        std::set<std::string> other;
-        for (const auto& entry : ReadCatalog(mo.data(), mo.size()))
-            other.insert(entry.first);
-        EXPECT_EQ(other, keys) << lang;
-    }
+    // Product names keep their English form; nearly all else changes in a real translation.
+    EXPECT_TRUE(texts.empty() || translated >= 13) << translated;
 }
+
+// The language, then the catalogue that translates (none: English). ja_JP and pt_BR use
+// two-letter catalogues; de_XX is installed nowhere.
+INSTANTIATE_TEST_SUITE_P(Languages, MenusInLanguage,
+                         testing::Values("de_DE DE", "fr_FR FR", "es_ES ES", "it_IT IT", "nl_NL NL",
+                                         "ja_JP JA", "zh_CN ZH_CN", "pt_BR PT", "ko_KR", "en_US",
+                                         "de_XX DE"),
+                         [](const auto& info) { return info.param.substr(0, 5); });

@@ -13,16 +13,10 @@ StandinDir::StandinDir(const std::vector<std::string>& names)
         throw std::runtime_error("cannot create a directory from " + pattern);
     // Started programs report their real working directory; make Path() match it.
     m_path = fs::canonical(pattern).string();
-    try {
-        for (const std::string& name : names) {
-            const fs::path link = fs::path(m_path) / name;
-            fs::create_directories(link.parent_path());
-            fs::create_symlink(VELTRONA_STANDIN_PATH, link);
-        }
-    } catch (...) {
-        std::error_code ignored;
-        fs::remove_all(m_path, ignored);
-        throw;
+    for (const std::string& name : names) {
+        const fs::path link = fs::path(m_path) / name;
+        fs::create_directories(link.parent_path());
+        fs::create_symlink(VELTRONA_STANDIN_PATH, link);
     }
 }
 

@@ -8,14 +8,13 @@
 std::string UnescapeField(const std::string& text)
 {
     std::string out;
-    out.reserve(text.size());
     for (size_t i = 0; i < text.size(); ++i) {
-        if (text[i] != '\\' || i + 1 == text.size()) {
-            out += text[i];
-            continue;
+        char c = text[i];
+        if (c == '\\' && i + 1 < text.size()) {
+            c = text[++i];
+            c = c == 'n' ? '\n' : c == 't' ? '\t' : c;
         }
-        const char next = text[++i];
-        out += next == 'n' ? '\n' : next == 't' ? '\t' : next;
+        out += c;
     }
     return out;
 }
@@ -23,33 +22,23 @@ std::string UnescapeField(const std::string& text)
 std::vector<StandinRecord> ReadRecords(const std::string& path)
 {
     std::vector<StandinRecord> records;
+    StandinRecord record;
     std::ifstream in(path);
-    std::string line;
-    StandinRecord current;
-    // A record counts once its "end" line is there; lines outside a record
-    // that began with "exe" are the tail of a damaged one and are skipped.
-    bool open = false;
-    while (std::getline(in, line)) {
+    // A record counts once its "end" line is there.
+    for (std::string line; std::getline(in, line);) {
         const size_t tab = line.find('\t');
         const std::string key = line.substr(0, tab);
-        const std::string value =
-            tab == std::string::npos ? std::string() : UnescapeField(line.substr(tab + 1));
-        if (key == "exe") {
-            current = StandinRecord();
-            current.exe = value;
-            open = true;
-        } else if (!open) {
-            continue;
-        } else if (key == "pid") {
-            current.pid = static_cast<pid_t>(std::strtol(value.c_str(), nullptr, 10));
-        } else if (key == "cwd") {
-            current.cwd = value;
-        } else if (key == "arg") {
-            current.args.push_back(value);
-        } else if (key == "end") {
-            records.push_back(current);
-            open = false;
-        }
+        const std::string value = tab == line.npos ? "" : UnescapeField(line.substr(tab + 1));
+        if (key == "exe")
+            record = {value, 0, "", {}};
+        else if (key == "pid")
+            record.pid = std::atoi(value.c_str());
+        else if (key == "cwd")
+            record.cwd = value;
+        else if (key == "arg")
+            record.args.push_back(value);
+        else if (key == "end")
+            records.push_back(record);
     }
     return records;
 }
@@ -57,11 +46,6 @@ std::vector<StandinRecord> ReadRecords(const std::string& path)
 std::vector<StandinRecord> WaitForRecords(const std::string& path, size_t count, int timeoutMs)
 {
     std::vector<StandinRecord> records;
-    WaitFor(
-        [&] {
-            records = ReadRecords(path);
-            return records.size() >= count;
-        },
-        timeoutMs);
+    WaitFor([&] { return (records = ReadRecords(path)).size() >= count; }, timeoutMs);
     return records;
 }

@@ -34,12 +34,9 @@ wxMsgCatalog* LoadFromMemory(const wxString& domain, const wxString& lang)
 
 wxMsgCatalog* MemoryTranslationsLoader::LoadCatalog(const wxString& domain, const wxString& lang)
 {
+    // The toolkit asks again with the two-letter language ("pt" after "pt_BR").
     if (wxMsgCatalog* catalog = LoadFromMemory(domain, lang))
         return catalog;
-    const wxString base = lang.BeforeFirst('_');
-    if (base != lang)
-        if (wxMsgCatalog* catalog = LoadFromMemory(domain, base))
-            return catalog;
     return m_files.LoadCatalog(domain, lang);
 }
 

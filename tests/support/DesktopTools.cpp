@@ -1,0 +1,41 @@
+#include "support/DesktopTools.h"
+
+#include <cstdio>
+#include <cstdlib>
+
+namespace {
+
+std::string Capture(const std::string& command)
+{
+    std::string out;
+    if (FILE* pipe = popen(command.c_str(), "r")) {
+        char buffer[256];
+        while (fgets(buffer, sizeof buffer, pipe))
+            out += buffer;
+        pclose(pipe);
+    }
+    return out;
+}
+
+} // namespace
+
+unsigned long ActiveWindow()
+{
+    // "_NET_ACTIVE_WINDOW: window id # 0x400007"
+    const std::string line = Capture("xprop -root -notype _NET_ACTIVE_WINDOW 2>/dev/null");
+    const size_t hash = line.find("# ");
+    return hash == std::string::npos ? 0 : std::strtoul(line.c_str() + hash + 2, nullptr, 16);
+}
+
+unsigned long WindowOf(pid_t pid, const std::string& title)
+{
+    return std::strtoul(Capture("xdotool search --onlyvisible --pid " + std::to_string(pid) +
+                                " --name '^" + title + "$' 2>/dev/null")
+                            .c_str(),
+                        nullptr, 10);
+}
+
+void CloseWindow(unsigned long window)
+{
+    std::system(("wmctrl -i -c " + std::to_string(window)).c_str());
+}

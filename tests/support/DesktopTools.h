@@ -1,0 +1,15 @@
+// What a user's desktop tools see on the test's X display: the active window,
+// and a window asked to close through the window manager.
+#pragma once
+
+#include <string>
+#include <sys/types.h>
+
+// The window manager's active window, 0 when there is none.
+unsigned long ActiveWindow();
+
+// The id of process `pid`'s visible window titled exactly `title`, 0 if none.
+unsigned long WindowOf(pid_t pid, const std::string& title);
+
+// Asks the window manager to close the window, as its close box does.
+void CloseWindow(unsigned long window);
