@@ -3,6 +3,7 @@
 #pragma once
 
 #include <wx/modalhook.h>
+#include <wx/msgdlg.h>
 #include <wx/string.h>
 
 #include <vector>
@@ -22,7 +23,17 @@ public:
     const std::vector<RecordedDialog>& Dialogs() const { return m_dialogs; }
 
 protected:
-    int Enter(wxDialog* dialog) override;
+    int Enter(wxDialog* dialog) override
+    {
+        RecordedDialog record;
+        record.caption = dialog->GetTitle();
+        if (auto* box = dynamic_cast<wxMessageDialog*>(dialog)) {
+            record.message = box->GetMessage();
+            record.style = box->GetMessageDialogStyle();
+        }
+        m_dialogs.push_back(record);
+        return wxID_OK;
+    }
 
 private:
     std::vector<RecordedDialog> m_dialogs;
