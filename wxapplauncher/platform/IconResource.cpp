@@ -1,19 +1,10 @@
 #include "platform/IconResource.h"
 
+#include "platform/LittleEndian.h"
+
 #include <cstring>
 
 namespace {
-
-std::uint16_t Le16(const unsigned char* p)
-{
-    return std::uint16_t(p[0] | p[1] << 8);
-}
-
-std::uint32_t Le32(const unsigned char* p)
-{
-    return std::uint32_t(p[0]) | std::uint32_t(p[1]) << 8 | std::uint32_t(p[2]) << 16 |
-           std::uint32_t(p[3]) << 24;
-}
 
 // Larger icons than this are not icons; the limit also bounds the memory asked for.
 const std::int32_t maxIconSide = 1024;

@@ -1,5 +1,7 @@
 #include "resources/CatalogFormat.h"
 
+#include "platform/LittleEndian.h"
+
 #include <cstdint>
 #include <initializer_list>
 
@@ -10,8 +12,7 @@ std::uint32_t Read32(const unsigned char* p, bool bigEndian)
     if (bigEndian)
         return std::uint32_t(p[0]) << 24 | std::uint32_t(p[1]) << 16 | std::uint32_t(p[2]) << 8 |
                std::uint32_t(p[3]);
-    return std::uint32_t(p[0]) | std::uint32_t(p[1]) << 8 | std::uint32_t(p[2]) << 16 |
-           std::uint32_t(p[3]) << 24;
+    return Le32(p);
 }
 
 // True when count entries of entrySize bytes at offset lie inside size.
