@@ -7,9 +7,7 @@ set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")"
 build="$(realpath -m "${BUILD_DIR:-build}")"
 
-scripts/install-deps.sh
-cmake -S . -B "$build" -DCMAKE_BUILD_TYPE=RelWithDebInfo
-cmake --build "$build" -j2
+scripts/build.sh "$build"
 
 launcher="$build/demo/Veltrona.exe"
 if [ -n "${DISPLAY:-}" ]; then

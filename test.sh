@@ -6,9 +6,7 @@ set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")"
 build="$(realpath -m "${BUILD_DIR:-build}")"
 
-scripts/install-deps.sh
-cmake -S . -B "$build" -DCMAKE_BUILD_TYPE=RelWithDebInfo
-cmake --build "$build" -j2
+scripts/build.sh "$build"
 scripts/with-xvfb.sh ctest --test-dir "$build" --output-on-failure --no-tests=error
 
 # ---- Further test stages go below this line; each must exit non-zero on failure.
