@@ -3,7 +3,7 @@
 #include "about/Splash.h"
 #include "frame/Veltro3AppFrame.h"
 #include "help/CContextualHelp.h"
-#include "help/Documentation.h"
+#include "help/HelpTool.h"
 #include "platform/InstanceLock.h"
 #include "platform/PrivateRuntimeDir.h"
 #include "resources/Catalogs.h"

@@ -4,4 +4,3 @@
 void OpenUserGuide() {}
 void OpenUserForum() {}
 void OpenHowTo() {}
-void ShowHelpToolDialog(const wxString&, const wxString&) {}

@@ -1,4 +1,4 @@
-// The user guide, the help tool dialog and the suite's web pages.
+// The user guide and the suite's web pages.
 #pragma once
 
 #include <wx/string.h>
@@ -6,4 +6,3 @@
 void OpenUserGuide();
 void OpenUserForum();
 void OpenHowTo();
-void ShowHelpToolDialog(const wxString& appName, const wxString& page);
