@@ -82,7 +82,9 @@ int main(int argc, char** argv)
     Recorder recorder;
     recorder.Register();
     wxEvtHandler::AddFilter(&recorder);
-    wxApp::SetInstance(new Veltro3App);
+    // Created where the launcher's own entry point creates it, after the
+    // toolkit has read the command line.
+    wxApp::SetInitializerFunction([]() -> wxAppConsole* { return new Veltro3App; });
     const int result = wxEntry(argc, argv);
     wxEvtHandler::RemoveFilter(&recorder);
     return result;

@@ -1,11 +1,12 @@
 #include "app/Veltro3App.h"
 
 #include "about/Splash.h"
+#include "app/CommandLineFile.h"
+#include "app/UserLanguage.h"
 #include "frame/Veltro3AppFrame.h"
 #include "help/CContextualHelp.h"
 #include "help/HelpTool.h"
 #include "platform/InstanceLock.h"
-#include "platform/PrivateRuntimeDir.h"
 #include "resources/Catalogs.h"
 #include "settings/UpdateCheck.h"
 
@@ -14,7 +15,7 @@
 #include <wx/filesys.h>
 #include <wx/fs_mem.h>
 #include <wx/log.h>
-#include <wx/snglinst.h>
+#include <wx/stdpaths.h>
 #include <wx/timer.h>
 #include <wx/utils.h>
 
@@ -23,9 +24,13 @@ const int kSplashMilliseconds = 2000;
 const int kMinimumResolutionPreset = 1;
 } // namespace
 
-wxBEGIN_EVENT_TABLE(Veltro3App, wxApp) EVT_IDLE(Veltro3App::OnIdle) wxEND_EVENT_TABLE()
+// clang-format off
+wxBEGIN_EVENT_TABLE(Veltro3App, wxApp)
+    EVT_IDLE(Veltro3App::OnIdle)
+wxEND_EVENT_TABLE()
+// clang-format on
 
-    Veltro3App* GetVeltro3App()
+Veltro3App* GetVeltro3App()
 {
     return dynamic_cast<Veltro3App*>(wxTheApp);
 }
@@ -57,14 +62,16 @@ bool Veltro3App::OnInit()
     m_singleInstanceChecker = nullptr;
     m_splashTimer = new wxTimer;
 
-    const wxLanguage language = static_cast<wxLanguage>(wxLocale::GetSystemLanguage());
-    // A locale that is not installed reads as unknown; the texts then stay English.
-    if (language != wxLANGUAGE_UNKNOWN)
-        m_locale.Init(language, wxLOCALE_LOAD_DEFAULT);
-    PrepareTranslations(m_locale, language);
+    // Relative paths on the command line name files where the caller stood.
+    m_commandLineFile = CommandLineFile(argv, argc, wxGetCwd());
 
-    const wxString launcherDir =
-        wxFileName(argv[0], wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR);
+    DecideUserLanguage();
+    InitLocale(m_locale);
+
+    // The running executable, not argv[0]: that is a bare name when the
+    // launcher is found through PATH, or the path of a link to it.
+    const wxString launcherDir = wxFileName(wxStandardPaths::Get().GetExecutablePath())
+                                     .GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR);
 
     wxFileSystem::AddHandler(new wxMemoryFSHandler);
     LoadCatalogResources();
@@ -77,10 +84,8 @@ bool Veltro3App::OnInit()
         return false;
 
     const wxString instanceName = GetVendorName() + "." + GetAppName() + "." + wxGetUserId();
-    const wxString lockDir = GetPrivateRuntimeDir();
-    RemoveStaleInstanceLock(lockDir, instanceName);
-    m_singleInstanceChecker = new wxSingleInstanceChecker;
-    m_singleInstanceChecker->Create(instanceName, lockDir);
+    m_singleInstanceChecker = new InstanceLock;
+    m_singleInstanceChecker->Create(instanceName);
 
     if (m_singleInstanceChecker->IsAnotherRunning()) {
         // The toolkit does not call OnExit after a failed OnInit.
@@ -137,7 +142,7 @@ void Veltro3App::RunDeferredStartup()
     m_frame->Show();
 
     if (argc > 1)
-        m_pendingFile = argv[1];
+        m_pendingFile = m_commandLineFile;
     if (!m_pendingFile.empty() && m_frame) {
         const wxString path = m_pendingFile;
         m_pendingFile.clear();
