@@ -111,7 +111,7 @@ TEST_F(StartupTest, WorksFromItsOwnFolderAndOpensTheCallersFile)
         ASSERT_TRUE(WaitFor([&] { return (frame = WindowOf(runs[i]->Pid(), "Veltrona")) != 0; }));
         CloseWindow(frame);
         int status = 0;
-        ASSERT_TRUE(runs[i]->WaitForExit(10000, status));
+        ASSERT_TRUE(runs[i]->WaitForExit(10000, status)) << i;
         if (!cases[i].opened.empty())
             expected.insert(cases[i].opened);
     }

@@ -29,7 +29,7 @@ unsigned long ActiveWindow()
 
 unsigned long WindowOf(pid_t pid, const std::string& title)
 {
-    return std::strtoul(Capture("xdotool search --onlyvisible --pid " + std::to_string(pid) +
+    return std::strtoul(Capture("xdotool search --all --onlyvisible --pid " + std::to_string(pid) +
                                 " --name '^" + title + "$' 2>/dev/null")
                             .c_str(),
                         nullptr, 10);
