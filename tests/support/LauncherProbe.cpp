@@ -1,8 +1,12 @@
 // The real launcher with two recorders added, for process-level tests: every
 // modal dialog (answered with OK, never shown) and every top-level window that
-// is shown are appended to the file named by VELTRONA_PROBE_LOG.
+// is shown are appended to the file named by VELTRONA_PROBE_LOG. With
+// VELTRONA_PROBE_COMMAND=<id>, the menu command <id> goes to the top window
+// once it is first shown, and its start and end are recorded as "command"
+// events (id, then milliseconds since the probe started).
 #include "app/Veltro3App.h"
 
+#include <wx/app.h>
 #include <wx/eventfilter.h>
 #include <wx/init.h>
 #include <wx/modalhook.h>
@@ -17,6 +21,13 @@
 namespace {
 
 const auto kStart = std::chrono::steady_clock::now();
+
+std::string Elapsed()
+{
+    return std::to_string(std::chrono::duration_cast<std::chrono::milliseconds>(
+                              std::chrono::steady_clock::now() - kStart)
+                              .count());
+}
 
 std::string Escape(const wxString& text)
 {
@@ -65,14 +76,32 @@ protected:
     {
         if (event.GetEventType() == wxEVT_SHOW && static_cast<wxShowEvent&>(event).IsShown()) {
             if (auto* window = dynamic_cast<wxTopLevelWindow*>(event.GetEventObject())) {
-                const auto elapsed = std::chrono::duration_cast<std::chrono::milliseconds>(
-                    std::chrono::steady_clock::now() - kStart);
-                Append("shown\t" + Escape(window->GetTitle()) + "\t" +
-                       std::to_string(elapsed.count()));
+                Append("shown\t" + Escape(window->GetTitle()) + "\t" + Elapsed());
+                if (window == wxTheApp->GetTopWindow())
+                    SendCommandOnce(window);
             }
         }
         return Event_Skip;
     }
+
+private:
+    void SendCommandOnce(wxWindow* window)
+    {
+        const char* id = std::getenv("VELTRONA_PROBE_COMMAND");
+        if (m_commandSent || !id)
+            return;
+        m_commandSent = true;
+        const std::string command = id;
+        window->CallAfter([window, command] {
+            Append("command\t" + command + "\t" + Elapsed());
+            wxCommandEvent event(wxEVT_MENU, std::atoi(command.c_str()));
+            event.SetEventObject(window);
+            window->ProcessWindowEvent(event);
+            Append("command\t" + command + "\t" + Elapsed());
+        });
+    }
+
+    bool m_commandSent = false;
 };
 
 } // namespace
