@@ -51,8 +51,9 @@ TEST(ContextualHelpTest, ApplicationIdIsTheFirstMatchingProductsAndItsServiceIsR
         EXPECT_EQ(help.m_helpService, "Help");
         // An empty service name is refused: nothing is registered.
         EXPECT_EQ(help.m_server != nullptr, *c.id != '\0');
-        if (*c.id)
+        if (*c.id) {
             EXPECT_TRUE(fs::exists(runtime.Path() + "/veltrona/" + c.id));
+        }
     }
 }
 
