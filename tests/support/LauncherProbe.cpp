@@ -1,6 +1,7 @@
 // The real launcher with two recorders added, for process-level tests: every
 // modal dialog (answered with OK, never shown) and every top-level window that
-// is shown are appended to the file named by VELTRONA_PROBE_LOG. With
+// is shown are appended to the file named by VELTRONA_PROBE_LOG (a dialog that
+// is no message box also with the texts of its controls, one per line). With
 // VELTRONA_PROBE_COMMAND=<id>, the menu command <id> goes to the top window
 // once it is first shown, and its start and end are recorded as "command"
 // events (id, then milliseconds since the probe started).
@@ -11,6 +12,7 @@
 #include <wx/init.h>
 #include <wx/modalhook.h>
 #include <wx/msgdlg.h>
+#include <wx/textctrl.h>
 #include <wx/toplevel.h>
 
 #include <chrono>
@@ -67,8 +69,15 @@ protected:
             message = box->GetMessage();
             style = box->GetMessageDialogStyle();
         }
+        wxString controls;
+        for (const wxWindow* child : dialog->GetChildren()) {
+            if (const auto* field = dynamic_cast<const wxTextCtrl*>(child))
+                controls += field->GetValue() + "\n";
+            else if (const auto* control = dynamic_cast<const wxControl*>(child))
+                controls += control->GetLabel() + "\n";
+        }
         Append("dialog\t" + Escape(message) + "\t" + Escape(caption) + "\t" +
-               std::to_string(style));
+               std::to_string(style) + "\t" + Escape(controls));
         return wxID_OK;
     }
 
