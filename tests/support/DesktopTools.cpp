@@ -39,3 +39,14 @@ void CloseWindow(unsigned long window)
 {
     std::system(("wmctrl -i -c " + std::to_string(window)).c_str());
 }
+
+void MinimiseWindow(unsigned long window)
+{
+    std::system(("xdotool windowminimize " + std::to_string(window)).c_str());
+}
+
+bool IsMinimised(unsigned long window)
+{
+    return Capture("xprop -id " + std::to_string(window) + " WM_STATE 2>/dev/null")
+               .find("Iconic") != std::string::npos;
+}

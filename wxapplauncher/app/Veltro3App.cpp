@@ -2,7 +2,9 @@
 
 #include "about/Splash.h"
 #include "app/CommandLineFile.h"
+#include "app/HandOver.h"
 #include "app/UserLanguage.h"
+#include "app/Veltro3AppLauncherIPC.h"
 #include "frame/Veltro3AppFrame.h"
 #include "help/CContextualHelp.h"
 #include "help/HelpTool.h"
@@ -87,10 +89,18 @@ bool Veltro3App::OnInit()
     m_singleInstanceChecker = new InstanceLock;
     m_singleInstanceChecker->Create(instanceName);
 
+    const wxString serviceName = instanceName + ".ipc";
     if (m_singleInstanceChecker->IsAnotherRunning()) {
+        HandOverToRunningCopy(serviceName, m_commandLineFile);
         // The toolkit does not call OnExit after a failed OnInit.
         OnExit();
         return false;
+    }
+
+    m_launcherServer = new Veltro3AppLauncherIPCServer;
+    if (!m_launcherServer->Create(serviceName)) {
+        delete m_launcherServer;
+        m_launcherServer = nullptr;
     }
 
     ShowSplash(true, kSplashMilliseconds);
@@ -99,6 +109,12 @@ bool Veltro3App::OnInit()
     m_frame = new Veltro3AppFrame(_("Veltrona"), wxDefaultPosition, wxDefaultSize);
     m_frame->Centre(wxBOTH);
     SetTopWindow(m_frame);
+    // The toolkit destroys the frame; nothing may reach it afterwards.
+    m_frame->Bind(wxEVT_DESTROY, [this](wxWindowDestroyEvent& event) {
+        if (event.GetEventObject() == m_frame)
+            m_frame = nullptr;
+        event.Skip();
+    });
 
     m_contextualHelp = new CContextualHelp(GetAppName());
     m_contextualHelp->Start();
@@ -111,10 +127,14 @@ int Veltro3App::OnExit()
         wxTheClipboard->Flush();
     delete m_splashTimer;
     m_splashTimer = nullptr;
-    delete m_singleInstanceChecker;
-    m_singleInstanceChecker = nullptr;
+    // The services go before the lock: a copy that takes the lock next finds
+    // none of our sockets, and its own are never removed by us.
+    delete m_launcherServer;
+    m_launcherServer = nullptr;
     delete m_contextualHelp;
     m_contextualHelp = nullptr;
+    delete m_singleInstanceChecker;
+    m_singleInstanceChecker = nullptr;
     return 0;
 }
 
@@ -138,25 +158,31 @@ void Veltro3App::RunDeferredStartup()
 
     CheckForUpdateAtLaunch();
 
+    if (!m_frame)
+        return;
     m_frame->Raise();
     m_frame->Show();
 
-    if (argc > 1)
-        m_pendingFile = m_commandLineFile;
-    if (!m_pendingFile.empty() && m_frame) {
-        const wxString path = m_pendingFile;
-        m_pendingFile.clear();
-        m_frame->OpenInInspect(path);
-    }
+    // The launcher's own file first, then those later copies sent meanwhile.
+    if (!m_commandLineFile.empty())
+        m_queuedFiles.Insert(m_commandLineFile, 0);
+    OpenPendingFile();
 }
 
 void Veltro3App::OpenPendingFile()
 {
-    if (m_pendingFile.empty() || m_deferredStartupPending || !m_frame)
+    // Paths that arrive before the frame shows wait in order; none replaces another.
+    if (!m_pendingFile.empty()) {
+        m_queuedFiles.Add(m_pendingFile);
+        m_pendingFile.clear();
+    }
+    if (m_deferredStartupPending)
         return;
-    const wxString path = m_pendingFile;
-    m_pendingFile.clear();
-    m_frame->OpenInInspect(path);
+    while (!m_queuedFiles.empty() && m_frame && m_frame->IsShown()) {
+        const wxString path = m_queuedFiles[0];
+        m_queuedFiles.RemoveAt(0);
+        m_frame->OpenInInspect(path);
+    }
 }
 
 void Veltro3App::ShowContextHelp(const wxString& page)

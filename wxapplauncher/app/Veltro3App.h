@@ -3,6 +3,7 @@
 #pragma once
 
 #include <wx/app.h>
+#include <wx/arrstr.h>
 #include <wx/intl.h>
 #include <wx/string.h>
 
@@ -40,6 +41,8 @@ public:
     wxLocale m_locale;
     wxString m_pendingFile;
     Veltro3AppFrame* m_frame;
+    // Paths to open once the frame shows, oldest first.
+    wxArrayString m_queuedFiles;
 
 private:
     // The first command-line argument, absolute; empty when it cannot be used.
