@@ -67,6 +67,9 @@ void HandOverToRunningCopy(const wxString& service, const wxString& path)
     Watchdog watchdog(deadline);
     wxLogNull quiet;
 
+    // A refused socket path stays refused: nothing to wait for.
+    if (GetServiceSocketPath(service).empty())
+        return;
     IpcClient client;
     std::unique_ptr<wxConnectionBase> connection;
     for (;;) {

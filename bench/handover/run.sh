@@ -1,0 +1,7 @@
+#!/usr/bin/env bash
+# A second copy started with a file: from its exec to the Inspect stand-in's start
+# record in the running copy, beside a second copy that only finds the lock and ends.
+set -euo pipefail
+build="$1"
+cmake --build "$build" --target bench_handover demo >/dev/null
+"$build/bench/handover/bench_handover" "$build/demo"
