@@ -1,19 +1,16 @@
-// The IPC layer: sockets only in the user's private directory, conversations
-// with another process that arrive whole or are refused, connection attempts
-// that end however the server behaves, and servers that remove only their own
-// socket.
+// The IPC layer: sockets only in the user's private directory and only where
+// they fit, servers that remove only their own socket, and conversations with
+// another process that arrive whole, are refused, or end on their deadline.
 #include "platform/Ipc.h"
 #include "support/GuiWait.h"
+#include "support/ProbeRun.h"
 #include "support/StandinDir.h"
-#include "support/ViewerLog.h"
 
 #include <gtest/gtest.h>
 #include <wx/utils.h>
 
 #include <csignal>
-#include <cstdlib>
 #include <filesystem>
-#include <functional>
 #include <memory>
 #include <sys/socket.h>
 #include <sys/stat.h>
@@ -24,7 +21,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-// A private runtime directory of the test's own, as XDG_RUNTIME_DIR.
+// A runtime directory of the test's own, as XDG_RUNTIME_DIR.
 struct RuntimeDir
 {
     RuntimeDir() : dir({})
@@ -38,69 +35,41 @@ struct RuntimeDir
 
 TEST(IpcTest, SocketsOnlyInAPrivateDirectoryAndOnlyWhereTheyFit)
 {
+    const size_t room = sizeof(sockaddr_un::sun_path) - 2 - RuntimeDir().Sockets().size();
     struct Case
     {
-        const char* what;
-        std::function<void(const std::string& sockets)> prepare;
-        size_t nameLength; // a name of this many "x" when `name` is empty
+        mode_t folderMode; // 0: the folder is made by the layer
+        bool link, foreign;
         std::string name;
         bool accepted;
     };
-    const auto none = [](const std::string&) {};
-    const auto privateDir = [](const std::string& sockets) { mkdir(sockets.c_str(), 0700); };
-    const RuntimeDir probe;
-    const size_t room = sizeof(sockaddr_un::sun_path) - 1 - (probe.Sockets().size() + 1);
-    const std::vector<Case> cases = {
-        {"a plain name", none, 0, "Help", true},
-        {"an empty name", none, 0, "", false},
-        {"a name with a separator", none, 0, "a/b", false},
-        {"the parent folder", none, 0, "..", false},
-        {"the longest path that fits", none, room, "", true},
-        {"a path one byte too long", none, room + 1, "", false},
-        {"a link to a private folder",
-         [](const std::string& sockets) {
-             mkdir((sockets + "-real").c_str(), 0700);
-             symlink((sockets + "-real").c_str(), sockets.c_str());
-         },
-         0, "Help", false},
-        {"a folder open to others",
-         [](const std::string& sockets) {
-             mkdir(sockets.c_str(), 0700);
-             chmod(sockets.c_str(), 0755);
-         },
-         0, "Help", false},
-        {"a folder open to the group",
-         [](const std::string& sockets) {
-             mkdir(sockets.c_str(), 0700);
-             chmod(sockets.c_str(), 0710);
-         },
-         0, "Help", false},
-        {"another user's folder",
-         [privateDir](const std::string& sockets) {
-             privateDir(sockets);
-             if (chown(sockets.c_str(), getuid() + 1, getgid()) != 0)
-                 GTEST_SKIP() << "changing a folder's owner needs root";
-         },
-         0, "Help", false},
+    const Case cases[] = {
+        {0, false, false, "Help", true},
+        {0, false, false, "", false},
+        {0, false, false, "a/b", false},
+        {0, false, false, std::string(room, 'x'), true},
+        {0, false, false, std::string(room + 1, 'x'), false},
+        {0700, true, false, "Help", false},
+        {0755, false, false, "Help", false},
+        {0710, false, false, "Help", false},
+        {0700, false, true, "Help", false},
     };
     for (const Case& c : cases) {
-        SCOPED_TRACE(c.what);
+        SCOPED_TRACE(testing::Message() << &c - cases);
         const RuntimeDir runtime;
-        c.prepare(runtime.Sockets());
-        const std::string name = c.name.empty() ? std::string(c.nameLength, 'x') : c.name;
-        const wxString path = GetServiceSocketPath(wxString::FromUTF8(name));
-        IpcServer server;
-        const bool created = server.Create(wxString::FromUTF8(name));
-        EXPECT_EQ(created, c.accepted);
-        if (c.accepted) {
-            EXPECT_EQ(path.utf8_string(), runtime.Sockets() + "/" + name);
-            struct stat info;
-            EXPECT_TRUE(stat(path.utf8_str(), &info) == 0 && S_ISSOCK(info.st_mode));
-        } else {
-            EXPECT_TRUE(path.empty()) << path;
-            IpcClient client;
-            EXPECT_EQ(client.Connect(wxString::FromUTF8(name), "IPC START", 200), nullptr);
+        const std::string folder = runtime.Sockets() + (c.link ? "-real" : "");
+        if (c.folderMode) {
+            mkdir(folder.c_str(), 0700);
+            chmod(folder.c_str(), c.folderMode);
         }
+        if (c.link)
+            symlink(folder.c_str(), runtime.Sockets().c_str());
+        if (c.foreign) {
+            ASSERT_EQ(chown(folder.c_str(), getuid() + 1, getgid()), 0) << "needs root";
+        }
+        IpcServer server;
+        EXPECT_EQ(server.Create(wxString::FromUTF8(c.name)), c.accepted);
+        EXPECT_EQ(fs::is_socket(runtime.Sockets() + "/" + c.name), c.accepted);
     }
 }
 
@@ -108,17 +77,13 @@ TEST(IpcTest, ServerRemovesOnlyItsOwnSocket)
 {
     const RuntimeDir runtime;
     const std::string path = runtime.Sockets() + "/LaunchPad";
-    auto older = std::make_unique<IpcServer>();
-    ASSERT_TRUE(older->Create("LaunchPad"));
-    auto newer = std::make_unique<IpcServer>();
-    ASSERT_TRUE(newer->Create("LaunchPad"));
+    auto older = std::make_unique<IpcServer>(), newer = std::make_unique<IpcServer>();
+    ASSERT_TRUE(older->Create("LaunchPad") && newer->Create("LaunchPad"));
     struct stat before, after;
     ASSERT_EQ(lstat(path.c_str(), &before), 0);
-
     older.reset();
     ASSERT_EQ(lstat(path.c_str(), &after), 0) << "the newer server's socket was removed";
     EXPECT_EQ(after.st_ino, before.st_ino);
-
     newer.reset();
     EXPECT_FALSE(fs::exists(path));
 }
@@ -126,9 +91,9 @@ TEST(IpcTest, ServerRemovesOnlyItsOwnSocket)
 TEST(IpcTest, ConversationsWithAnotherProcess)
 {
     const RuntimeDir runtime;
-    const StandinDir install({});
-    const std::string log = install.Path() + "/viewer.log";
-    wxExecuteEnv env{install.Path(), wxEnvVariableHashMap()};
+    const StandinDir work({});
+    const std::string log = work.Path() + "/viewer.log";
+    wxExecuteEnv env{work.Path(), wxEnvVariableHashMap()};
     wxGetEnvMap(&env.env);
     env.env["VELTRONA_HELP_LOG"] = log;
     const char* argv[] = {VELTRONA_HELPVIEWER_PATH, nullptr};
@@ -144,47 +109,42 @@ TEST(IpcTest, ConversationsWithAnotherProcess)
     }));
     EXPECT_EQ(client.Connect("Help", "Application", 500), nullptr);
 
-    struct Poke
-    {
-        const char* what;
-        std::string bytes; // sent through the untyped overload when `format` is set
-        wxIPCFormat format;
-        ViewerLine logged;
-    };
+    // Sent as a string when the format is wxIPC_INVALID, else as raw bytes.
     const std::string longText = "LaunchPad$" + std::string(2000, 'p') + "*ü.html";
-    const std::vector<Poke> pokes = {
-        {"a long text", longText, wxIPC_INVALID, {"poke", "Application", longText}},
-        {"text after a NUL", std::string("Exit\0more", 9), wxIPC_TEXT, {"poke", "Item", "Exit"}},
-        {"broken UTF-8", "Raise\xff\xfe", wxIPC_UTF8TEXT, {"refused", "Item"}},
-        {"binary data", "Raise", wxIPC_PRIVATE, {"refused", "Item"}},
-        {"wide text", std::string("R\0\0\0\0\0\0\0", 8), wxIPC_UNICODETEXT, {"refused", "Item"}},
-        {"more than 64 KiB", std::string(64 * 1024 + 1, 'x'), wxIPC_TEXT, {"refused", "Item"}},
+    const struct
+    {
+        std::string bytes;
+        wxIPCFormat format;
+        std::vector<std::string> logged; // kind, then its fields
+    } pokes[] = {
+        {longText, wxIPC_INVALID, {"poke", "Item", longText}},
+        {std::string("Exit\0more", 9), wxIPC_TEXT, {"poke", "Item", "Exit"}},
+        {"Raise\xff\xfe", wxIPC_UTF8TEXT, {"refused", "Item"}},
+        {"Raise", wxIPC_PRIVATE, {"refused", "Item"}},
+        {std::string("R\0\0\0\0\0\0\0", 8), wxIPC_UNICODETEXT, {"refused", "Item"}},
+        {std::string(64 * 1024 + 1, 'x'), wxIPC_TEXT, {"refused", "Item"}},
     };
-    for (const Poke& poke : pokes) {
-        SCOPED_TRACE(poke.what);
-        const size_t before = ReadViewerLog(log).size();
+    for (const auto& poke : pokes) {
+        SCOPED_TRACE(testing::Message() << &poke - pokes);
+        const size_t before = ReadEventLog(log).size();
         if (poke.format == wxIPC_INVALID)
-            connection->Poke("Application", wxString::FromUTF8(poke.bytes));
+            connection->Poke("Item", wxString::FromUTF8(poke.bytes));
         else
             connection->Poke("Item", poke.bytes.data(), poke.bytes.size(), poke.format);
-        ASSERT_TRUE(WaitFor([&] { return ReadViewerLog(log).size() > before; }));
-        const ViewerLine line = ReadViewerLog(log)[before];
-        EXPECT_TRUE(line == poke.logged) << line.front() << " " << line.size() << " fields";
+        ASSERT_TRUE(WaitFor([&] { return ReadEventLog(log).size() > before; }));
+        const ProbeEvent line = ReadEventLog(log)[before];
+        EXPECT_EQ(line.kind, poke.logged[0]);
+        EXPECT_TRUE(line.fields ==
+                    std::vector<std::string>(poke.logged.begin() + 1, poke.logged.end()));
     }
 
-    // A server that has stopped answering: the attempt ends on its deadline.
+    // A server that stopped answering, and a socket whose owner never accepts.
     kill(viewer, SIGSTOP);
     EXPECT_EQ(client.Connect("Help", "IPC START", 300), nullptr);
     kill(viewer, SIGCONT);
-    connection.reset(client.Connect("Help", "IPC START", 5000));
-    EXPECT_NE(connection, nullptr);
-
-    // A socket whose owner never accepts: a connect that the kernel completes.
-    const std::string silentPath = runtime.Sockets() + "/Silent";
     const int silent = socket(AF_UNIX, SOCK_STREAM, 0);
-    sockaddr_un address = {};
-    address.sun_family = AF_UNIX;
-    silentPath.copy(address.sun_path, silentPath.size());
+    sockaddr_un address = {AF_UNIX, {}};
+    (runtime.Sockets() + "/Silent").copy(address.sun_path, sizeof address.sun_path - 1);
     ASSERT_EQ(bind(silent, reinterpret_cast<sockaddr*>(&address), sizeof address), 0);
     ASSERT_EQ(listen(silent, 4), 0);
     EXPECT_EQ(client.Connect("Silent", "IPC START", 300), nullptr);
