@@ -14,6 +14,7 @@
 #include <gtest/gtest.h>
 #include <wx/utils.h>
 
+#include <csignal>
 #include <filesystem>
 #include <memory>
 #include <set>
@@ -66,7 +67,6 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
     connection->Poke("Application", "raise* /lower.icc");
     connection->Poke("application", "Raise* /item.icc");
     connection->Poke("Application", garbage, sizeof garbage, wxIPC_TEXT);
-    connection->Poke("Application", "Raise*/nospace.icc");
     connection->Poke("Application", wxString::FromUTF8("Raise* /last.icc"));
     connection->Disconnect();
 
@@ -91,6 +91,11 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
     ASSERT_TRUE(WaitFor([&] { return IsMinimised(frame); }));
     handOver({});
     EXPECT_TRUE(WaitFor([&] { return !IsMinimised(frame); }));
+
+    // A frozen first copy keeps no later copy waiting, and gets nothing from it.
+    kill(first.Pid(), SIGSTOP);
+    handOver({"frozen.icc"});
+    kill(first.Pid(), SIGCONT);
 
     CloseWindow(frame);
     int status = 0;
@@ -126,7 +131,6 @@ TEST(RaiseServiceTest, OnlyWellFormedRaisePokesAreProcessed)
         {"Application", "Raise* /\xc3(.icc", wxIPC_UTF8TEXT, false, ""},
         {"Application", "Raise* /f.icc", wxIPC_PRIVATE, false, ""},
         {"Application", oversized, wxIPC_UTF8TEXT, false, ""},
-        {"Application", " Raise", wxIPC_UTF8TEXT, false, ""},
     };
     Veltro3AppLauncherIPCConnection connection;
     connection.SetConnected(false); // no peer: the pokes are handed to it directly
