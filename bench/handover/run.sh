@@ -3,5 +3,4 @@
 # record in the running copy, beside a second copy that only finds the lock and ends.
 set -euo pipefail
 build="$1"
-cmake --build "$build" --target bench_handover demo >/dev/null
 "$build/bench/handover/bench_handover" "$build/demo"
