@@ -118,35 +118,28 @@ TEST(RaiseServiceTest, OnlyWellFormedRaisePokesAreProcessed)
         std::string item, data;
         wxIPCFormat format;
         bool processed;
-        std::string queued;
     } cases[] = {
-        {"Application", "Raise", wxIPC_UTF8TEXT, true, ""},
-        {"Application", "Raise* ", wxIPC_UTF8TEXT, true, ""},
-        {"Application", std::string("Raise* /a.icc\0/b.icc", 20), wxIPC_UTF8TEXT, true, "/a.icc"},
-        {"Application", "Raise* /x*y.icc", wxIPC_TEXT, true, "/x*y.icc"},
-        {"Application", "raise* /c.icc", wxIPC_UTF8TEXT, false, ""},
-        {"application", "Raise* /d.icc", wxIPC_UTF8TEXT, false, ""},
-        {"Application", "Raise*", wxIPC_UTF8TEXT, false, ""},
-        {"Application", "Raise*/e.icc", wxIPC_UTF8TEXT, false, ""},
-        {"Application", "Raise* /\xc3(.icc", wxIPC_UTF8TEXT, false, ""},
-        {"Application", "Raise* /f.icc", wxIPC_PRIVATE, false, ""},
-        {"Application", oversized, wxIPC_UTF8TEXT, false, ""},
+        {"Application", "Raise", wxIPC_UTF8TEXT, true},
+        {"Application", "Raise* ", wxIPC_UTF8TEXT, true},
+        {"Application", std::string("Raise* /a.icc\0/b.icc", 20), wxIPC_UTF8TEXT, true},
+        {"Application", "Raise* /x*y.icc", wxIPC_TEXT, true},
+        {"Application", "raise* /c.icc", wxIPC_UTF8TEXT, false},
+        {"application", "Raise* /d.icc", wxIPC_UTF8TEXT, false},
+        {"Application", "Raise*", wxIPC_UTF8TEXT, false},
+        {"Application", "Raise*/e.icc", wxIPC_UTF8TEXT, false},
+        {"Application", "Raise* /\xc3(.icc", wxIPC_UTF8TEXT, false},
+        {"Application", "Raise* /f.icc", wxIPC_PRIVATE, false},
+        {"Application", oversized, wxIPC_UTF8TEXT, false},
     };
     Veltro3AppLauncherIPCConnection connection;
     connection.SetConnected(false); // no peer: the pokes are handed to it directly
-    std::vector<std::string> queued;
-    for (const auto& c : cases) {
+    for (const auto& c : cases)
         EXPECT_EQ(connection.OnPoke("IPC START", c.item, c.data.data(), c.data.size(), c.format),
                   c.processed)
             << c.data.substr(0, 40);
-        if (!c.queued.empty())
-            queued.push_back(c.queued);
-    }
-    // Paths that arrived before the frame showed wait, in order.
-    wxArrayString expected;
-    for (const std::string& path : queued)
-        expected.Add(path);
-    EXPECT_EQ(app->m_queuedFiles, expected);
+    // Paths that arrived before the frame showed wait, in order, cut at the NUL.
+    EXPECT_EQ(std::vector<wxString>(app->m_queuedFiles.begin(), app->m_queuedFiles.end()),
+              (std::vector<wxString>{"/a.icc", "/x*y.icc"}));
 
     // A frame on its way out is not touched.
     app->m_frame->Destroy();
