@@ -41,11 +41,11 @@ wxBEGIN_EVENT_TABLE(ZelStaticBitmap, wxControl)
     EVT_KILL_FOCUS(ZelStaticBitmap::OnKillFocus)
     EVT_MOUSE_CAPTURE_LOST(ZelStaticBitmap::OnCaptureLost)
 wxEND_EVENT_TABLE()
-    // clang-format on
+// clang-format on
 
-    ZelStaticBitmap::ZelStaticBitmap(wxWindow* parent, wxWindowID id, const wxBitmap& bitmap,
-                                     const wxPoint& pos, const wxSize& size, long style,
-                                     const wxString& name)
+ZelStaticBitmap::ZelStaticBitmap(wxWindow* parent, wxWindowID id, const wxBitmap& bitmap,
+                                 const wxPoint& pos, const wxSize& size, long style,
+                                 const wxString& name)
     : m_bitmap(bitmap), m_framed((style & ZSB_FRAMED) != 0)
 {
     if (m_framed)
