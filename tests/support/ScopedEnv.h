@@ -1,5 +1,5 @@
-// Environment variables set for one test and put back afterwards, so that a
-// run of several tests in one process stays independent.
+// Environment variables set for one test and put back afterwards, so that
+// tests run one after the other in one process stay independent.
 #pragma once
 
 #include <cstdlib>
@@ -11,31 +11,20 @@
 class ScopedEnv
 {
 public:
-    // A value of std::nullopt removes the variable.
-    explicit ScopedEnv(const std::vector<std::pair<std::string, std::optional<std::string>>>& vars)
+    explicit ScopedEnv(const std::vector<std::pair<std::string, std::string>>& vars)
     {
         for (const auto& [name, value] : vars) {
             const char* old = std::getenv(name.c_str());
             m_saved.emplace_back(name, old ? std::optional<std::string>(old) : std::nullopt);
-            Set(name, value);
+            setenv(name.c_str(), value.c_str(), 1);
         }
     }
     ~ScopedEnv()
     {
-        for (const auto& [name, value] : m_saved)
-            Set(name, value);
+        for (const auto& [name, old] : m_saved)
+            old ? setenv(name.c_str(), old->c_str(), 1) : unsetenv(name.c_str());
     }
-    ScopedEnv(const ScopedEnv&) = delete;
-    ScopedEnv& operator=(const ScopedEnv&) = delete;
 
 private:
-    static void Set(const std::string& name, const std::optional<std::string>& value)
-    {
-        if (value)
-            setenv(name.c_str(), value->c_str(), 1);
-        else
-            unsetenv(name.c_str());
-    }
-
     std::vector<std::pair<std::string, std::optional<std::string>>> m_saved;
 };
