@@ -4,6 +4,8 @@
 
 #include <wx/process.h>
 
+#include <utility>
+
 namespace {
 
 // Watches the opener: xdg-open starts at once and reports later, through its

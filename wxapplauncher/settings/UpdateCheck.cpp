@@ -34,6 +34,9 @@ void StartUpdater()
     // By its full path in the launcher's folder (the working directory): a
     // bare name would be looked up on PATH instead.
     const wxArrayString argv(1, wxFileName(wxGetCwd(), kUpdaterName).GetFullPath());
+    // A missing updater is not reported; nothing is started in vain.
+    if (!wxFileName::FileExists(argv[0]))
+        return;
     wxProcess* process = new wxProcess(nullptr, wxID_ANY);
     if (StartProcess(argv, process) == 0)
         delete process;
