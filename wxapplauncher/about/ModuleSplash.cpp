@@ -30,9 +30,9 @@ wxBEGIN_EVENT_TABLE(ZelModuleSplashScreen, wxDialog)
     EVT_CHAR(ZelModuleSplashScreen::OnKeyOrFocusLoss)
     EVT_PAINT(ZelModuleSplashScreen::OnPaint)
 wxEND_EVENT_TABLE()
-// clang-format on
+    // clang-format on
 
-wxBitmap LoadCommonBitmap(const wxString& name)
+    wxBitmap LoadCommonBitmap(const wxString& name)
 {
     EnsureCommonImages();
     return wxXmlResource::Get()->LoadBitmap(name);
@@ -52,6 +52,8 @@ ZelModuleSplashScreen::ZelModuleSplashScreen(int id, const wxArrayString& lines)
     SetWindowStyle(wxFRAME_SHAPED);
     ShapeToPicture(this, m_picture);
 
+    // Without children the window itself must take the keyboard focus, or keys never reach it.
+    SetCanFocus(true);
     SetFocus();
     Show(true);
     Update();

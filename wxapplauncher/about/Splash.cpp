@@ -87,8 +87,7 @@ const char* const kCredits[] = {
     "Used under licence.",
 };
 
-template <size_t N>
-void AddTranslated(wxArrayString& lines, const char* const (&texts)[N])
+template <size_t N> void AddTranslated(wxArrayString& lines, const char* const (&texts)[N])
 {
     for (const char* text : texts)
         lines.Add(wxGetTranslation(text));
@@ -150,6 +149,6 @@ void ShowSplash(bool startup, int milliseconds)
         startup ? "Veltro2AppFrame::SplashMainApp" : "Veltro2AppFrame::SplashAboutMainApp");
     const wxPoint textCentre = startup ? wxPoint(162, 346) : wxPoint(192, 372);
     // The About box may be dismissed at once; the start-up splash only by its timer.
-    new ZelAboutSplashScreen(-1, startup, milliseconds, picture, lines, textCentre,
-                             windowLineCount, kMargin, wxColour(180, 180, 180, 255), !startup);
+    new ZelAboutSplashScreen(-1, startup, milliseconds, picture, lines, textCentre, windowLineCount,
+                             kMargin, wxColour(180, 180, 180, 255), !startup);
 }

@@ -3,14 +3,11 @@
 #include "about/PictureWindow.h"
 #include "controls/TextBitmap.h"
 
-#include <gdk/gdk.h>
-#ifdef GDK_WINDOWING_X11
-#include <gdk/gdkx.h>
-#endif
+#include "platform/ScreenCapture.h"
+
 #include <wx/app.h>
 #include <wx/dcclient.h>
 #include <wx/dcmemory.h>
-#include <wx/dcscreen.h>
 #include <wx/settings.h>
 #include <wx/utils.h>
 
@@ -24,16 +21,6 @@ const int kScrollPeriodMs = 80;
 // The lowest rows of the text window show the picture while the text does not wrap.
 const int kPictureRows = 10;
 const int kLargeCharHeight = 16;
-
-// Only an X11 desktop lets a program read what lies on the screen.
-bool CanCaptureScreen()
-{
-#ifdef GDK_WINDOWING_X11
-    return GDK_IS_X11_DISPLAY(gdk_display_get_default());
-#else
-    return false;
-#endif
-}
 
 } // namespace
 
@@ -54,9 +41,9 @@ wxEND_EVENT_TABLE()
 wxBEGIN_EVENT_TABLE(ZelAboutSplashScreen, ZelSplashScreen)
     EVT_CLOSE(ZelAboutSplashScreen::OnCloseWindow)
 wxEND_EVENT_TABLE()
-// clang-format on
+    // clang-format on
 
-wxFont SplashTextFont(wxWindow* window)
+    wxFont SplashTextFont(wxWindow* window)
 {
     const wxString face = wxSystemSettings::GetFont(wxSYS_DEFAULT_GUI_FONT).GetFaceName();
     wxFont font(8, wxFONTFAMILY_SWISS, wxFONTSTYLE_NORMAL, wxFONTWEIGHT_NORMAL, false, face);
@@ -104,6 +91,8 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     CentreOnPrimaryDisplay(this, size);
     ShapeToPicture(this, m_background);
 
+    // Without children the window itself must take the keyboard focus, or keys never reach it.
+    SetCanFocus(true);
     SetFocus();
     Raise();
     // What lies beneath must be painted before it is captured.
@@ -122,6 +111,10 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
 
     m_scrollOffset = 0;
     Show(true);
+    // Raising before the window is mapped does not activate it on X11; without activation
+    // it would see neither keys nor the loss of activation that closes it.
+    if (!m_startup)
+        Raise();
     UpdateText();
 
     if (m_milliseconds != 0) {
@@ -145,21 +138,14 @@ ZelSplashScreen::~ZelSplashScreen()
 
 void ZelSplashScreen::BlendWithScreen()
 {
-    if (!m_background.IsOk() || !CanCaptureScreen())
+    if (!m_background.IsOk())
         return;
     const wxImage picture = m_background.ConvertToImage();
     if (!picture.IsOk() || !picture.HasAlpha() || !picture.GetData())
         return;
     const int width = picture.GetWidth(), height = picture.GetHeight();
-    wxBitmap captured(width, height);
-    {
-        wxMemoryDC target(captured);
-        wxScreenDC screen;
-        const wxPoint at = GetPosition();
-        if (!target.Blit(0, 0, width, height, &screen, at.x, at.y, wxCOPY))
-            return;
-    }
-    wxImage blended = captured.ConvertToImage();
+    // Without a capture (no X11 desktop) the picture is shown unblended.
+    wxImage blended = CaptureScreen(wxRect(GetPosition(), picture.GetSize()));
     if (!blended.IsOk() || !blended.GetData())
         return;
     unsigned char* out = blended.GetData();
@@ -186,7 +172,8 @@ void ZelSplashScreen::UpdateText()
         background.SelectObject(wxNullBitmap);
         auto draw = [&](int fromRow, int rows, int atY) {
             if (rows > 0)
-                composite.DrawBitmap(m_text.GetSubBitmap(wxRect(0, fromRow, w, rows)), x, atY, true);
+                composite.DrawBitmap(m_text.GetSubBitmap(wxRect(0, fromRow, w, rows)), x, atY,
+                                     true);
         };
         if (total <= h) {
             // Text shorter than its window: shown once, never a second copy below it.

@@ -60,9 +60,8 @@ class ZelAboutSplashScreen : public ZelSplashScreen
 public:
     // closeAllowed: whether the user may close the window before its timer has fired.
     ZelAboutSplashScreen(int id, bool startup, int milliseconds, const wxBitmap& picture,
-                         const wxArrayString& lines, const wxPoint& textCentre,
-                         int windowLineCount, int margin, const wxColour& colour,
-                         bool closeAllowed);
+                         const wxArrayString& lines, const wxPoint& textCentre, int windowLineCount,
+                         int margin, const wxColour& colour, bool closeAllowed);
 
 private:
     void OnCloseWindow(wxCloseEvent& event);
@@ -78,5 +77,5 @@ wxFont SplashTextFont(wxWindow* window);
 
 // Where the text window lies on a picture of the given width: centred on textCentre,
 // but kept within the margins, the left one first.
-wxRect PlaceTextWindow(int pictureWidth, const wxSize& text, const wxPoint& textCentre,
-                       int height, int margin);
+wxRect PlaceTextWindow(int pictureWidth, const wxSize& text, const wxPoint& textCentre, int height,
+                       int margin);

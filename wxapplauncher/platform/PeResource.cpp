@@ -19,7 +19,8 @@ struct ResourceSection
 
     bool Read(std::uint64_t offset, unsigned char* out, std::size_t count) const
     {
-        return offset <= size && count <= size - offset && source->Read(fileOffset + offset, out, count);
+        return offset <= size && count <= size - offset &&
+               source->Read(fileOffset + offset, out, count);
     }
 };
 
@@ -77,7 +78,8 @@ bool ReadPeResource(const ByteSource& source, std::uint16_t type, std::uint16_t 
     const unsigned sectionCount = Le16(coff + 6);
     const unsigned optionalSize = Le16(coff + 20);
     unsigned char optional[240] = {};
-    if (optionalSize < 2 || !source.Read(pe + 24, optional, optionalSize < 240 ? optionalSize : 240))
+    if (optionalSize < 2 ||
+        !source.Read(pe + 24, optional, optionalSize < 240 ? optionalSize : 240))
         return false;
     const unsigned magic = Le16(optional);
     if (magic != 0x10B && magic != 0x20B)

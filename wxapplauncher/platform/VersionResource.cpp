@@ -52,10 +52,17 @@ bool FindFixedFileInfo(const std::vector<unsigned char>& block, std::size_t& fix
     return true;
 }
 
-VersionResourceResult ReadVersionResource(const std::string& path, std::vector<unsigned char>& block,
+VersionResourceResult ReadVersionResource(const std::string& path,
+                                          std::vector<unsigned char>& block,
                                           std::size_t& fixedInfoOffset)
 {
-    const FileByteSource source(path);
+    return ReadVersionResource(FileByteSource(path), block, fixedInfoOffset);
+}
+
+VersionResourceResult ReadVersionResource(const ByteSource& source,
+                                          std::vector<unsigned char>& block,
+                                          std::size_t& fixedInfoOffset)
+{
     block.clear();
     if (!ReadPeResource(source, ResourceTypeVersion, versionName, maxVersionBlock, block) &&
         !ReadFromElf(source, block))

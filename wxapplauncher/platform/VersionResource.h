@@ -16,8 +16,14 @@ enum class VersionResourceResult
 
 // Reads the version resource of the file into block and checks its root block; on
 // Found, fixedInfoOffset is where the VS_FIXEDFILEINFO starts (its 52 bytes lie in block).
-VersionResourceResult ReadVersionResource(const std::string& path, std::vector<unsigned char>& block,
+VersionResourceResult ReadVersionResource(const std::string& path,
+                                          std::vector<unsigned char>& block,
                                           std::size_t& fixedInfoOffset);
 
-// The same for a resource block already in memory.
+class ByteSource;
+VersionResourceResult ReadVersionResource(const ByteSource& source,
+                                          std::vector<unsigned char>& block,
+                                          std::size_t& fixedInfoOffset);
+
+// Checks the root block of a version resource already in memory.
 bool FindFixedFileInfo(const std::vector<unsigned char>& block, std::size_t& fixedInfoOffset);
