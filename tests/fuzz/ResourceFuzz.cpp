@@ -14,13 +14,36 @@
 
 namespace {
 
+// Hands the bytes to the toolkit as the program's loader does; the toolkit's translations
+// object owns, and frees, what it parses.
+class BytesLoader : public wxTranslationsLoader
+{
+public:
+    BytesLoader(const unsigned char* data, std::size_t size) : m_data(data), m_size(size) {}
+    wxMsgCatalog* LoadCatalog(const wxString& domain, const wxString&) override
+    {
+        return wxMsgCatalog::CreateFromData(
+            wxScopedCharBuffer::CreateNonOwned(reinterpret_cast<const char*>(m_data), m_size),
+            domain);
+    }
+    wxArrayString GetAvailableTranslations(const wxString&) const override
+    {
+        return wxArrayString(1, "de");
+    }
+
+private:
+    const unsigned char* m_data;
+    std::size_t m_size;
+};
+
 void ReadAsCatalogue(const unsigned char* data, std::size_t size)
 {
     if (!IsWellFormedCatalog(data, size))
         return;
-    const wxScopedCharBuffer bytes =
-        wxScopedCharBuffer::CreateNonOwned(reinterpret_cast<const char*>(data), size);
-    delete wxMsgCatalog::CreateFromData(bytes, "Veltro");
+    wxTranslations translations;
+    translations.SetLanguage("de");
+    translations.SetLoader(new BytesLoader(data, size));
+    translations.AddCatalog("Veltro");
 }
 
 } // namespace
