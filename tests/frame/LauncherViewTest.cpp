@@ -117,6 +117,14 @@ TEST_F(LauncherViewTest, LayoutAndPixels)
     }
     EXPECT_FALSE(m_view->GetDropTarget());
 
+    // A system colour change gives Inspect and Edit the view colour again.
+    Button(1104)->SetBackgroundColour(*wxRED);
+    Button(1103)->SetBackgroundColour(*wxRED);
+    wxSysColourChangedEvent changed;
+    m_view->ProcessWindowEvent(changed);
+    EXPECT_EQ(Button(1104)->GetBackgroundColour(), wxColour(224, 223, 227));
+    EXPECT_EQ(Button(1103)->GetBackgroundColour(), wxColour(224, 223, 227));
+
     // The column titles are drawn dark over the light picture.
     ASSERT_TRUE(WaitFor([&] {
         const wxImage view = Grab(m_view);
