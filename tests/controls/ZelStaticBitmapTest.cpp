@@ -28,7 +28,7 @@ enum Action
     DOWN,
     UP,
     DCLICK,
-    HIDE_SHOW,
+    HIDE_SHOW
 };
 
 // An action and the state the button is in once it has been handled.

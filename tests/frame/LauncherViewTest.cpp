@@ -14,28 +14,23 @@
 #include <wx/uiaction.h>
 #include <wx/utils.h>
 
-#include <memory>
-
 namespace {
 
-wxImage Grab(wxWindow* window)
-{
-    return ScreenPixels(window->GetScreenRect());
-}
+const wxColour kViewColour(224, 223, 227);
 
-// Whether the screen shows `image` drawn over `background` at every pixel
-// (off by a little at most, for rounding in the toolkit's blending).
-bool Shows(const wxImage& screen, const wxBitmap& image, const wxColour& background)
+// Whether the screen shows `image` drawn over the button's background at
+// every pixel (off by a little at most, for rounding in the toolkit).
+bool Shows(ZelStaticBitmap* button, const wxBitmap& image)
 {
+    const wxImage screen = ScreenPixels(button->GetScreenRect());
+    const wxColour bg = button->GetBackgroundColour();
     wxImage back(image.GetWidth(), image.GetHeight());
-    back.SetRGB(wxRect(back.GetSize()), background.Red(), background.Green(), background.Blue());
+    back.SetRGB(wxRect(back.GetSize()), bg.Red(), bg.Green(), bg.Blue());
     const wxImage expected = CompositeBitmap(wxBitmap(back), image).ConvertToImage();
     if (screen.GetSize() != expected.GetSize())
         return false;
-    const unsigned char* a = screen.GetData();
-    const unsigned char* b = expected.GetData();
     for (long i = 0; i < 3L * screen.GetWidth() * screen.GetHeight(); ++i)
-        if (std::abs(a[i] - b[i]) > 3)
+        if (std::abs(screen.GetData()[i] - expected.GetData()[i]) > 3)
             return false;
     return true;
 }
@@ -50,116 +45,7 @@ int LabelStart(const wxImage& image)
     return -1;
 }
 
-class LauncherViewTest : public testing::Test
-{
-protected:
-    void SetUp() override
-    {
-        m_frame = new Veltro3AppFrame("Veltrona", wxPoint(50, 50), wxDefaultSize);
-        m_view = m_frame->GetStandardView();
-        m_frame->Show();
-        // Placed by the window manager and painted: the screen shows a button.
-        ZelStaticBitmap* printer = Button(1101);
-        ASSERT_TRUE(WaitFor([&] {
-            return Shows(Grab(printer), printer->GetBitmap(), printer->GetBackgroundColour());
-        }));
-    }
-    // The next test's window must not find this one still under the pointer.
-    void TearDown() override
-    {
-        bool gone = false;
-        m_frame->Bind(wxEVT_DESTROY, [&](wxWindowDestroyEvent& e) {
-            gone = gone || e.GetEventObject() == m_frame;
-            e.Skip();
-        });
-        m_frame->Destroy();
-        EXPECT_TRUE(WaitFor([&] { return gone; }));
-    }
-
-    ZelStaticBitmap* Button(int id)
-    {
-        return static_cast<ZelStaticBitmap*>(m_view->FindWindow(id));
-    }
-
-    void PointAt(wxWindow* window)
-    {
-        const wxRect r = window->GetScreenRect();
-        m_sim.MouseMove(r.GetLeft() + r.width / 2, r.GetTop() + r.height / 2);
-    }
-
-    Veltro3AppFrame* m_frame = nullptr;
-    Veltro3MainAppStandardView* m_view = nullptr;
-    wxUIActionSimulator m_sim;
-};
-
-TEST_F(LauncherViewTest, LayoutAndPixels)
-{
-    EXPECT_EQ(m_view->GetSize(), wxSize(564, 344));
-    const struct
-    {
-        int id;
-        wxPoint at;
-        bool dropTarget;
-    } places[] = {
-        {1101, {228, 68}, false}, {1100, {228, 155}, false}, {1102, {228, 237}, false},
-        {1104, {405, 68}, true},  {1103, {405, 155}, false}, {1105, {405, 237}, false},
-        {1106, {10, 304}, false},
-    };
-    for (const auto& p : places) {
-        ZelStaticBitmap* button = Button(p.id);
-        ASSERT_TRUE(button) << p.id;
-        EXPECT_EQ(button->GetPosition(), p.at) << p.id;
-        EXPECT_EQ(button->GetDropTarget() != nullptr, p.dropTarget) << p.id;
-        EXPECT_EQ(button->GetCursor().IsOk(), p.id != 1106) << "hand cursor on modules only";
-        if (p.id != 1106) {
-            EXPECT_EQ(button->GetSize(), wxSize(152, 58)) << p.id;
-        }
-    }
-    EXPECT_FALSE(m_view->GetDropTarget());
-
-    // A system colour change gives Inspect and Edit the view colour again.
-    Button(1104)->SetBackgroundColour(*wxRED);
-    Button(1103)->SetBackgroundColour(*wxRED);
-    wxSysColourChangedEvent changed;
-    m_view->ProcessWindowEvent(changed);
-    EXPECT_EQ(Button(1104)->GetBackgroundColour(), wxColour(224, 223, 227));
-    EXPECT_EQ(Button(1103)->GetBackgroundColour(), wxColour(224, 223, 227));
-
-    // The column titles are drawn dark over the light picture.
-    ASSERT_TRUE(WaitFor([&] {
-        const wxImage view = Grab(m_view);
-        for (int x = 250; x < 330; ++x)
-            if (view.GetRed(x, 30) < 80)
-                return true;
-        return false;
-    }));
-
-    // Normal, hover and pressed look on the screen, under a real pointer.
-    ZelStaticBitmap* printer = Button(1101);
-    const wxColour colour = printer->GetBackgroundColour();
-    EXPECT_EQ(colour, wxColour(224, 223, 227));
-    PointAt(printer);
-    EXPECT_TRUE(WaitFor([&] { return Shows(Grab(printer), printer->GetBitmapHover(), colour); }));
-    m_sim.MouseDown();
-    EXPECT_TRUE(WaitFor([&] { return Shows(Grab(printer), printer->GetBitmapPressed(), colour); }));
-    m_sim.MouseMove(m_view->GetScreenPosition() + wxPoint(5, 100));
-    m_sim.MouseUp();
-    EXPECT_TRUE(WaitFor([&] { return Shows(Grab(printer), printer->GetBitmap(), colour); }))
-        << printer->GetState() << printer->HasCapture();
-
-    // The hover image has the highlight behind icon and label; the pressed
-    // label sits one pixel further left.
-    const wxImage normal = printer->GetBitmap().ConvertToImage();
-    const wxImage hover = printer->GetBitmapHover().ConvertToImage();
-    const wxImage pressed = printer->GetBitmapPressed().ConvertToImage();
-    EXPECT_EQ(normal.GetAlpha(100, 4), 0);
-    EXPECT_GT(hover.GetAlpha(100, 4), 100);
-    EXPECT_GT(hover.GetAlpha(30, 50), 100) << "below the icon";
-    EXPECT_GT(LabelStart(hover), 60);
-    EXPECT_EQ(LabelStart(pressed), LabelStart(hover) - 1);
-}
-
-TEST_F(LauncherViewTest, RealClicksStartModules)
+TEST(LauncherViewTest, LooksAndStartsModules)
 {
     StandinDir install({"Quenta Print Studio.exe", "Monitor/Zel Display Studio.exe",
                         "Quenta Link Studio.exe", "ZelVerifyStudio.exe",
@@ -168,33 +54,95 @@ TEST_F(LauncherViewTest, RealClicksStartModules)
     setenv("VELTRONA_STANDIN_LOG", log.c_str(), 1);
     setenv("VELTRONA_STANDIN_EXIT", "1", 1);
     wxSetWorkingDirectory(install.Path());
+
+    auto* frame = new Veltro3AppFrame("Veltrona", wxPoint(50, 50), wxDefaultSize);
+    Veltro3MainAppStandardView* view = frame->GetStandardView();
+    auto button = [&](int id) { return static_cast<ZelStaticBitmap*>(view->FindWindow(id)); };
+    ZelStaticBitmap* printer = button(1101);
+    frame->Show();
+    // Placed by the window manager and painted.
+    ASSERT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
+    EXPECT_EQ(view->GetSize(), wxSize(564, 344));
+    EXPECT_FALSE(view->GetDropTarget());
+
+    // The column titles are drawn dark over the light picture.
+    const wxImage titles = ScreenPixels(view->GetScreenRect());
+    int dark = 0;
+    for (int x = 250; x < 330; ++x)
+        dark += titles.GetRed(x, 30) < 80;
+    EXPECT_GT(dark, 5);
+
+    // Normal, hover and pressed look on the screen, under a real pointer.
+    wxUIActionSimulator sim;
+    auto pointAt = [&](wxWindow* w) {
+        const wxRect r = w->GetScreenRect();
+        sim.MouseMove(r.GetLeft() + r.width / 2, r.GetTop() + r.height / 2);
+    };
+    pointAt(printer);
+    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapHover()); }));
+    sim.MouseDown();
+    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapPressed()); }));
+    sim.MouseMove(view->GetScreenPosition() + wxPoint(5, 100));
+    sim.MouseUp();
+    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
+
+    // The hover image has the highlight behind icon and label; the pressed
+    // label sits one pixel further left.
+    const wxImage normal = printer->GetBitmap().ConvertToImage();
+    const wxImage hover = printer->GetBitmapHover().ConvertToImage();
+    EXPECT_EQ(normal.GetAlpha(100, 4), 0);
+    EXPECT_GT(hover.GetAlpha(100, 4), 100);
+    EXPECT_GT(hover.GetAlpha(30, 50), 100) << "below the icon";
+    EXPECT_GT(LabelStart(hover), 60);
+    EXPECT_EQ(LabelStart(printer->GetBitmapPressed().ConvertToImage()), LabelStart(hover) - 1);
+
+    // A system colour change gives Inspect and Edit the view colour again.
+    button(1104)->SetBackgroundColour(*wxRED);
+    button(1103)->SetBackgroundColour(*wxRED);
+    wxSysColourChangedEvent changed;
+    view->ProcessWindowEvent(changed);
+    EXPECT_EQ(button(1104)->GetBackgroundColour(), kViewColour);
+    EXPECT_EQ(button(1103)->GetBackgroundColour(), kViewColour);
+
+    // Where each button sits, and what a real click on it starts.
     int helpClicks = 0;
-    m_frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) {
+    frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) {
         helpClicks += e.GetId() == 1106;
         e.Skip();
     });
-
     const struct
     {
         int id;
+        wxPoint at;
         const char* exe;
     } buttons[] = {
-        {1101, "Quenta Print Studio.exe"},   {1100, "Monitor/Zel Display Studio.exe"},
-        {1102, "Quenta Link Studio.exe"},    {1105, "ZelVerifyStudio.exe"},
-        {1104, "Quenta Inspect Studio.exe"}, {1103, "Quenta Edit Studio.exe"},
+        {1101, {228, 68}, "Quenta Print Studio.exe"},
+        {1100, {228, 155}, "Monitor/Zel Display Studio.exe"},
+        {1102, {228, 237}, "Quenta Link Studio.exe"},
+        {1104, {405, 68}, "Quenta Inspect Studio.exe"},
+        {1103, {405, 155}, "Quenta Edit Studio.exe"},
+        {1105, {405, 237}, "ZelVerifyStudio.exe"},
+        {1106, {10, 304}, nullptr},
     };
     size_t started = 0;
     for (const auto& b : buttons) {
-        PointAt(Button(b.id));
-        m_sim.MouseClick();
+        ZelStaticBitmap* target = button(b.id);
+        ASSERT_TRUE(target) << b.id;
+        EXPECT_EQ(target->GetPosition(), b.at) << b.id;
+        EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
+        EXPECT_EQ(target->GetCursor().IsOk(), b.exe != nullptr) << "hand cursor on modules only";
+        pointAt(target);
+        sim.MouseClick();
+        if (!b.exe)
+            continue;
+        EXPECT_EQ(target->GetSize(), wxSize(152, 58)) << b.id;
         const auto records = WaitForRecords(log, ++started);
         ASSERT_EQ(records.size(), started) << b.exe;
         EXPECT_EQ(records.back().exe, install.Path() + "/" + b.exe);
     }
-    PointAt(Button(1106));
-    m_sim.MouseClick();
-    EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; }));
+    EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; })) << "the Help button reaches the frame";
     EXPECT_EQ(SettledRecords(log).size(), started);
+    frame->Destroy();
 }
 
 } // namespace
