@@ -28,6 +28,8 @@ packages=(
     clang
     libclang-rt-14-dev
     libtsan2
+    xdg-utils
+    file
 )
 
 missing=()

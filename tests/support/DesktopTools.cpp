@@ -34,7 +34,7 @@ unsigned long ActiveWindow()
 
 unsigned long WindowOf(pid_t pid, const std::string& title)
 {
-    return std::strtoul(Capture("xdotool search --onlyvisible --pid " + std::to_string(pid) +
+    return std::strtoul(Capture("xdotool search --all --onlyvisible --pid " + std::to_string(pid) +
                                 " --name '^" + title + "$' 2>/dev/null")
                             .c_str(),
                         nullptr, 10);
@@ -72,4 +72,15 @@ wxImage ScreenPixels(const wxRect& rect)
     }
     XCloseDisplay(display);
     return pixels;
+}
+
+void MinimiseWindow(unsigned long window)
+{
+    std::system(("xdotool windowminimize " + std::to_string(window)).c_str());
+}
+
+bool IsMinimised(unsigned long window)
+{
+    return Capture("xprop -id " + std::to_string(window) + " WM_STATE 2>/dev/null")
+               .find("Iconic") != std::string::npos;
 }

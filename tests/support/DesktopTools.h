@@ -19,3 +19,9 @@ class wxRect;
 
 // What the screen shows in a rectangle given in screen coordinates.
 wxImage ScreenPixels(const wxRect& rect);
+
+// Minimises the window as its title bar's button does, through the window manager.
+void MinimiseWindow(unsigned long window);
+
+// True while the window is minimised (its WM_STATE is Iconic).
+bool IsMinimised(unsigned long window);

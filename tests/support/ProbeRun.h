@@ -13,15 +13,30 @@ struct ProbeEvent
     std::vector<std::string> fields; // dialog: message, caption, style; shown: title, ms
 };
 
+// Every line of a log of tab-separated, escaped fields, the first being the kind
+// (the probe's log, the help viewer stand-in's log).
+std::vector<ProbeEvent> ReadEventLog(const std::string& path);
+
 using EnvList = std::vector<std::pair<std::string, std::string>>;
+
+// How the launcher is started, when not by its full path from the test's own
+// working directory.
+struct ProbeStart
+{
+    std::string program; // the file run; default <installDir>/Veltrona.exe
+    std::string argv0;   // what it is told its name is; default `program`
+    std::string cwd;     // where it starts
+};
 
 class ProbeRun
 {
 public:
-    // Runs `<installDir>/Veltrona.exe`, a link to the probe, with `args` and
-    // the test's environment plus `env`.
+    // Runs `<installDir>/Veltrona.exe`, the probe (a hard link, so that the
+    // launcher finds itself there), with `args` and the test's environment plus
+    // `env`. Stand-ins it starts become children of the test once it ends, so
+    // SettledRecords waits for them too.
     ProbeRun(const std::string& installDir, const std::vector<std::string>& args,
-             const EnvList& env = {});
+             const EnvList& env = {}, const ProbeStart& start = {});
     ~ProbeRun();
     ProbeRun(const ProbeRun&) = delete;
     ProbeRun& operator=(const ProbeRun&) = delete;

@@ -61,6 +61,6 @@ private:
     wxDECLARE_EVENT_TABLE();
 };
 
-// The Windows language number that the Verify module expects for the current
-// user-interface language.
+// The Windows language number that the Verify module expects for the user's
+// language as start-up decided it.
 int GetModuleLanguageId();
