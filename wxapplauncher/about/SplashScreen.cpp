@@ -41,9 +41,9 @@ wxEND_EVENT_TABLE()
 wxBEGIN_EVENT_TABLE(ZelAboutSplashScreen, ZelSplashScreen)
     EVT_CLOSE(ZelAboutSplashScreen::OnCloseWindow)
 wxEND_EVENT_TABLE()
-    // clang-format on
+// clang-format on
 
-    wxFont SplashTextFont(wxWindow* window)
+wxFont SplashTextFont(wxWindow* window)
 {
     const wxString face = wxSystemSettings::GetFont(wxSYS_DEFAULT_GUI_FONT).GetFaceName();
     wxFont font(8, wxFONTFAMILY_SWISS, wxFONTSTYLE_NORMAL, wxFONTWEIGHT_NORMAL, false, face);
@@ -102,12 +102,24 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
 
     const int perLine = startup ? kStartupPixelsPerLine : kAboutPixelsPerLine;
     const int height = std::min(int(lines.size()), windowLineCount) * perLine;
-    m_text = DrawTextLinesToBitmap(wxDefaultSize, wxDefaultPosition, SplashTextFont(this), lines,
-                                   m_colour, 0, -1);
+    const wxFont font = SplashTextFont(this);
+    m_text = DrawTextLinesToBitmap(wxDefaultSize, wxDefaultPosition, font, lines, m_colour, 0, -1);
+    // Left to the theme, each device context made on the window, two per paint, would look
+    // the window's font and colours up in it again.
+    SetOwnFont(font);
+    SetOwnForegroundColour(m_colour);
+    SetOwnBackgroundColour(GetBackgroundColour());
     if (m_background.IsOk())
         m_composite = m_background.GetSubBitmap(wxRect(size));
     if (m_composite.IsOk() && m_text.IsOk())
         m_textWindow = PlaceTextWindow(size.x, m_text.GetSize(), textCentre, height, margin);
+    // Made once: each tick and each paint only copies between them.
+    if (m_composite.IsOk()) {
+        m_compositeDC.SelectObject(m_composite);
+        m_backgroundDC.SelectObjectAsSource(m_background);
+    }
+    if (m_text.IsOk())
+        m_textDC.SelectObjectAsSource(m_text);
 
     m_scrollOffset = 0;
     Show(true);
@@ -165,28 +177,25 @@ void ZelSplashScreen::UpdateText()
         return;
     const int x = m_textWindow.x, y = m_textWindow.y, w = m_textWindow.width;
     const int h = m_textWindow.height, total = m_text.GetHeight(), s = m_scrollOffset;
-    {
-        wxMemoryDC composite(m_composite);
-        wxMemoryDC background(m_background);
-        composite.Blit(x, y, w, h, &background, x, y, wxCOPY, false);
-        background.SelectObject(wxNullBitmap);
-        auto draw = [&](int fromRow, int rows, int atY) {
-            if (rows > 0)
-                composite.DrawBitmap(m_text.GetSubBitmap(wxRect(0, fromRow, w, rows)), x, atY,
-                                     true);
-        };
-        if (total <= h) {
-            // Text shorter than its window: shown once, never a second copy below it.
-            draw(s, total - s, y);
-        } else if (s + h <= total) {
-            draw(s, h - kPictureRows, y);
-        } else {
-            // Past the end the text continues with its first line, without a gap.
-            draw(s, total - s, y);
-            draw(0, h - (total - s), y + total - s);
-        }
+    m_compositeDC.Blit(x, y, w, h, &m_backgroundDC, x, y, wxCOPY, false);
+    // A copy from a source with alpha is blended over what lies beneath it.
+    auto draw = [&](int fromRow, int rows, int atY) {
+        if (rows > 0)
+            m_compositeDC.Blit(x, atY, w, rows, &m_textDC, 0, fromRow, wxCOPY, true);
+    };
+    if (total <= h) {
+        // Text shorter than its window: shown once, never a second copy below it.
+        draw(s, total - s, y);
+    } else if (s + h <= total) {
+        draw(s, h - kPictureRows, y);
+    } else {
+        // Past the end the text continues with its first line, without a gap.
+        draw(s, total - s, y);
+        draw(0, h - (total - s), y + total - s);
     }
-    RefreshRect(m_textWindow, false);
+    // The top-level window's own Refresh repaints the whole window whatever rectangle it
+    // is given; the plain window's invalidates only the text window.
+    wxWindow::Refresh(false, &m_textWindow);
     Update();
 }
 
@@ -248,9 +257,8 @@ void ZelSplashScreen::OnPaint(wxPaintEvent&)
     wxPaintDC dc(this);
     if (!m_composite.IsOk())
         return;
-    wxMemoryDC composite(m_composite);
     for (wxRegionIterator r(GetUpdateRegion()); r; ++r)
-        dc.Blit(r.GetX(), r.GetY(), r.GetW(), r.GetH(), &composite, r.GetX(), r.GetY(), wxCOPY,
+        dc.Blit(r.GetX(), r.GetY(), r.GetW(), r.GetH(), &m_compositeDC, r.GetX(), r.GetY(), wxCOPY,
                 false);
 }
 

@@ -6,6 +6,7 @@
 #include <wx/arrstr.h>
 #include <wx/bitmap.h>
 #include <wx/colour.h>
+#include <wx/dcmemory.h>
 #include <wx/frame.h>
 #include <wx/timer.h>
 
@@ -51,6 +52,9 @@ private:
     int m_milliseconds = 0;
     int m_scrollOffset = 0;
     wxColour m_colour;
+    wxMemoryDC m_compositeDC;
+    wxMemoryDC m_backgroundDC;
+    wxMemoryDC m_textDC;
 
     wxDECLARE_EVENT_TABLE();
 };
