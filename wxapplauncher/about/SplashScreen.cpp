@@ -113,13 +113,16 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
         m_composite = m_background.GetSubBitmap(wxRect(size));
     if (m_composite.IsOk() && m_text.IsOk())
         m_textWindow = PlaceTextWindow(size.x, m_text.GetSize(), textCentre, height, margin);
+    // Only the text window of the background is ever copied again; the rest of it would
+    // only double the composite.
+    m_background = m_textWindow.IsEmpty() ? wxBitmap() : m_background.GetSubBitmap(m_textWindow);
     // Made once: each tick and each paint only copies between them.
-    if (m_composite.IsOk()) {
+    if (m_composite.IsOk())
         m_compositeDC.SelectObject(m_composite);
+    if (m_background.IsOk()) {
         m_backgroundDC.SelectObjectAsSource(m_background);
-    }
-    if (m_text.IsOk())
         m_textDC.SelectObjectAsSource(m_text);
+    }
 
     m_scrollOffset = 0;
     Show(true);
@@ -152,22 +155,28 @@ void ZelSplashScreen::BlendWithScreen()
 {
     if (!m_background.IsOk())
         return;
-    const wxImage picture = m_background.ConvertToImage();
-    if (!picture.IsOk() || !picture.HasAlpha() || !picture.GetData())
-        return;
-    const int width = picture.GetWidth(), height = picture.GetHeight();
-    // Without a capture (no X11 desktop) the picture is shown unblended.
-    wxImage blended = CaptureScreen(wxRect(GetPosition(), picture.GetSize()));
-    if (!blended.IsOk() || !blended.GetData())
-        return;
-    unsigned char* out = blended.GetData();
-    const unsigned char* in = picture.GetData();
-    const unsigned char* alpha = picture.GetAlpha();
-    for (size_t i = 0, n = size_t(width) * size_t(height); i < n; ++i) {
-        const unsigned a = alpha[i];
-        for (int c = 0; c < 3; ++c, ++out, ++in)
-            *out = static_cast<unsigned char>((*out * (255 - a) + *in * a) / 255);
+    wxImage blended;
+    {
+        const wxImage picture = m_background.ConvertToImage();
+        if (!picture.IsOk() || !picture.HasAlpha() || !picture.GetData())
+            return;
+        const int width = picture.GetWidth(), height = picture.GetHeight();
+        // Without a capture (no X11 desktop) the picture is shown unblended.
+        blended = CaptureScreen(wxRect(GetPosition(), picture.GetSize()));
+        if (!blended.IsOk() || !blended.GetData())
+            return;
+        unsigned char* out = blended.GetData();
+        const unsigned char* in = picture.GetData();
+        const unsigned char* alpha = picture.GetAlpha();
+        for (size_t i = 0, n = size_t(width) * size_t(height); i < n; ++i) {
+            const unsigned a = alpha[i];
+            for (int c = 0; c < 3; ++c, ++out, ++in)
+                *out = static_cast<unsigned char>((*out * (255 - a) + *in * a) / 255);
+        }
     }
+    // The loaded picture goes before the blend becomes a bitmap: the two would only add
+    // to the window's peak memory.
+    m_background = wxBitmap();
     m_background = wxBitmap(blended);
 }
 
@@ -177,7 +186,7 @@ void ZelSplashScreen::UpdateText()
         return;
     const int x = m_textWindow.x, y = m_textWindow.y, w = m_textWindow.width;
     const int h = m_textWindow.height, total = m_text.GetHeight(), s = m_scrollOffset;
-    m_compositeDC.Blit(x, y, w, h, &m_backgroundDC, x, y, wxCOPY, false);
+    m_compositeDC.Blit(x, y, w, h, &m_backgroundDC, 0, 0, wxCOPY, false);
     // A copy from a source with alpha is blended over what lies beneath it.
     auto draw = [&](int fromRow, int rows, int atY) {
         if (rows > 0)

@@ -133,6 +133,9 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
     }
 
     wxImage image = bitmap.ConvertToImage();
+    // Released before the image turns back into a bitmap: a long text would otherwise be
+    // held three times over at once.
+    bitmap = wxBitmap();
     if (!image.IsOk())
         return wxBitmap();
     if (!image.HasAlpha())
