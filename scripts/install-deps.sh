@@ -13,6 +13,7 @@ packages=(
     libgtest-dev
     googletest
     libx11-dev
+    libxtst-dev
     xvfb
     xauth
     openbox
@@ -27,6 +28,8 @@ packages=(
     clang
     libclang-rt-14-dev
     libtsan2
+    xdg-utils
+    file
 )
 
 missing=()

@@ -1,5 +1,10 @@
 #include "support/DesktopTools.h"
 
+#include <wx/image.h>
+
+#include <X11/Xlib.h>
+#include <X11/Xutil.h>
+
 #include <cstdio>
 #include <cstdlib>
 
@@ -29,7 +34,7 @@ unsigned long ActiveWindow()
 
 unsigned long WindowOf(pid_t pid, const std::string& title)
 {
-    return std::strtoul(Capture("xdotool search --onlyvisible --pid " + std::to_string(pid) +
+    return std::strtoul(Capture("xdotool search --all --onlyvisible --pid " + std::to_string(pid) +
                                 " --name '^" + title + "$' 2>/dev/null")
                             .c_str(),
                         nullptr, 10);
@@ -38,4 +43,44 @@ unsigned long WindowOf(pid_t pid, const std::string& title)
 void CloseWindow(unsigned long window)
 {
     std::system(("wmctrl -i -c " + std::to_string(window)).c_str());
+}
+
+wxImage ScreenPixels(const wxRect& rect)
+{
+    wxImage pixels(rect.width, rect.height);
+    Display* display = XOpenDisplay(nullptr);
+    if (!display)
+        return pixels;
+    XImage* image = XGetImage(display, DefaultRootWindow(display), rect.x, rect.y, rect.width,
+                              rect.height, AllPlanes, ZPixmap);
+    if (image) {
+        auto channel = [](unsigned long pixel, unsigned long mask) {
+            int shift = 0;
+            while (mask && !(mask & 1)) {
+                mask >>= 1;
+                ++shift;
+            }
+            return static_cast<unsigned char>(((pixel >> shift) & mask) * 255 / (mask ? mask : 1));
+        };
+        for (int y = 0; y < rect.height; ++y)
+            for (int x = 0; x < rect.width; ++x) {
+                const unsigned long p = XGetPixel(image, x, y);
+                pixels.SetRGB(x, y, channel(p, image->red_mask), channel(p, image->green_mask),
+                              channel(p, image->blue_mask));
+            }
+        XDestroyImage(image);
+    }
+    XCloseDisplay(display);
+    return pixels;
+}
+
+void MinimiseWindow(unsigned long window)
+{
+    std::system(("xdotool windowminimize " + std::to_string(window)).c_str());
+}
+
+bool IsMinimised(unsigned long window)
+{
+    return Capture("xprop -id " + std::to_string(window) + " WM_STATE 2>/dev/null")
+               .find("Iconic") != std::string::npos;
 }

@@ -1,0 +1,141 @@
+// Text drawn into alpha bitmaps, and alpha compositing, checked pixel by pixel.
+#include "controls/TextBitmap.h"
+
+#include <gtest/gtest.h>
+#include <wx/image.h>
+
+namespace {
+
+wxImage Draw(const wxString& text, const wxColour& colour = *wxBLACK, int points = 12,
+             wxSize size = wxSize(-1, -1), wxPoint at = wxDefaultPosition, int spacing = 0)
+{
+    wxImage image = DrawTextToBitmap(size, at, GetUIFont(points, wxNORMAL), text, colour,
+                                     wxALIGN_CENTER_VERTICAL * (at.y != -1), spacing)
+                        .ConvertToImage();
+    if (image.IsOk() && !image.HasAlpha())
+        image.InitAlpha();
+    return image;
+}
+
+// The right-most column with any coverage, -1 for none.
+int LastInkColumn(const wxImage& image)
+{
+    for (int x = image.GetWidth() - 1; x >= 0; --x)
+        for (int y = 0; y < image.GetHeight(); ++y)
+            if (image.GetAlpha(x, y) > 0)
+                return x;
+    return -1;
+}
+
+wxBitmap Filled(const wxColour& colour, unsigned char alpha, int side = 8)
+{
+    wxImage image(side, side);
+    image.SetRGB(wxRect(0, 0, side, side), colour.Red(), colour.Green(), colour.Blue());
+    image.InitAlpha();
+    memset(image.GetAlpha(), alpha, side * side);
+    return wxBitmap(image);
+}
+
+TEST(TextBitmapTest, DrawsText)
+{
+    const wxString text = "Hg Profile";
+    const wxImage white = Draw(text, *wxWHITE), black = Draw(text);
+    int lo = 255, hi = 0, worst = 0, notWhite = 0;
+    for (int i = 0; i < white.GetWidth() * white.GetHeight(); ++i) {
+        lo = std::min<int>(lo, white.GetAlpha()[i]);
+        hi = std::max<int>(hi, white.GetAlpha()[i]);
+        worst = std::max(worst, std::abs(black.GetAlpha()[i] - white.GetAlpha()[i]));
+        notWhite += white.GetData()[3 * i + 1] != 255;
+    }
+    EXPECT_EQ(lo, 0) << "clear around the glyphs";
+    EXPECT_EQ(hi, 255) << "opaque glyph cores";
+    EXPECT_EQ(notWhite, 0);
+    EXPECT_EQ(black.GetSize(), white.GetSize());
+    EXPECT_LE(worst, 48) << "black text has the alpha shape of white text";
+
+    const wxImage canvas = Draw("", wxColour(10, 20, 30), 12, wxSize(152, 58));
+    EXPECT_EQ(canvas.GetSize(), wxSize(152, 58));
+    EXPECT_EQ(LastInkColumn(canvas), -1) << "an empty text gives a transparent canvas";
+    EXPECT_EQ(canvas.GetGreen(151, 57), 20);
+
+    const int h = Draw("a").GetHeight();
+    const struct
+    {
+        const char* name;
+        int height, expected;
+    } heights[] = {
+        {"a, LF, LF, b: three lines", Draw("a\n\nb").GetHeight(), 3 * h},
+        {"a, LF: one line", Draw("a\n").GetHeight(), h},
+        {"spacing -1 overlaps a row",
+         Draw("a\nb", *wxBLACK, 12, wxSize(-1, -1), wxDefaultPosition, -1).GetHeight(), 2 * h - 2},
+        {"too narrow: shrinks one point at a time until it fits",
+         Draw(text, *wxBLACK, 12, wxSize(Draw(text, *wxBLACK, 10).GetWidth() + 2, -1)).GetHeight(),
+         Draw("a", *wxBLACK, 10).GetHeight()},
+        {"far too narrow: stops at 7 points", Draw(text, *wxBLACK, 12, wxSize(5, -1)).GetHeight(),
+         Draw("a", *wxBLACK, 7).GetHeight()},
+    };
+    for (const auto& c : heights)
+        EXPECT_EQ(c.height, c.expected) << c.name;
+
+    // A label right of an icon shrinks to the room it has instead of being cut.
+    const wxImage label =
+        Draw(wxString::FromUTF8("Verknüpfung"), *wxBLACK, 12, wxSize(152, 58), wxPoint(70, 29));
+    EXPECT_GT(LastInkColumn(label), 70);
+    EXPECT_LT(LastInkColumn(label), 151);
+
+    const wxFont bold = GetUIFont(8, wxBOLD), fallback = GetUIFont(-1, wxBOLD);
+    EXPECT_EQ(bold.GetPointSize(), 8);
+    EXPECT_EQ(bold.GetWeight(), wxFONTWEIGHT_BOLD);
+    EXPECT_EQ(bold.GetFaceName(), "Tahoma");
+    EXPECT_EQ(fallback.GetPointSize(), 12);
+    EXPECT_EQ(fallback.GetWeight(), wxFONTWEIGHT_NORMAL);
+}
+
+TEST(TextBitmapTest, Composites)
+{
+    wxImage baseImage = Filled(wxColour(0, 0, 255), 255).ConvertToImage();
+    baseImage.SetRGB(0, 0, 40, 50, 60);
+    baseImage.SetAlpha(0, 0, 0);
+    const wxBitmap base(baseImage);
+    const wxBitmap red = Filled(*wxRED, 255, 4);
+    wxImage masked(4, 4);
+    masked.SetRGB(wxRect(0, 0, 4, 4), 255, 0, 255);
+    masked.SetRGB(1, 1, 0, 255, 0);
+    masked.SetMaskColour(255, 0, 255);
+
+    const struct
+    {
+        const char* name;
+        wxBitmap overlay;
+        wxPoint at, probe;
+        wxColour expected; // with alpha
+    } cases[] = {
+        {"opaque overlay: its pixels", red, {2, 2}, {5, 5}, {255, 0, 0, 255}},
+        {"opaque overlay: base outside it", red, {2, 2}, {6, 6}, {0, 0, 255, 255}},
+        {"negative position", red, {-2, -2}, {1, 1}, {255, 0, 0, 255}},
+        {"transparent overlay keeps the base", Filled(*wxRED, 0), {0, 0}, {3, 3}, {0, 0, 255, 255}},
+        {"transparent over transparent: black", Filled(*wxRED, 0), {0, 0}, {0, 0}, {0, 0, 0, 0}},
+        {"half over opaque mixes", Filled(*wxRED, 128), {0, 0}, {4, 4}, {128, 0, 127, 255}},
+        {"half over clear keeps its colour", Filled(*wxRED, 128), {0, 0}, {0, 0}, {255, 0, 0, 128}},
+        {"mask is clear", wxBitmap(masked), {4, 4}, {4, 4}, {0, 0, 255, 255}},
+        {"the rest of a masked overlay is opaque",
+         wxBitmap(masked),
+         {4, 4},
+         {5, 5},
+         {0, 255, 0, 255}},
+        {"wholly outside: a copy of the base", red, {8, 0}, {0, 0}, {40, 50, 60, 0}},
+    };
+    for (const auto& c : cases) {
+        wxImage out = CompositeBitmap(base, c.overlay, c.at).ConvertToImage();
+        const int x = c.probe.x, y = c.probe.y;
+        EXPECT_EQ(wxColour(out.GetRed(x, y), out.GetGreen(x, y), out.GetBlue(x, y),
+                           out.HasAlpha() ? out.GetAlpha(x, y) : 255),
+                  c.expected)
+            << c.name;
+    }
+    EXPECT_FALSE(CompositeBitmap(wxBitmap(), base).IsOk());
+    EXPECT_FALSE(CompositeBitmap(base, wxBitmap()).IsOk());
+    EXPECT_EQ(base.ConvertToImage().GetAlpha(0, 0), 0) << "the base is left alone";
+}
+
+} // namespace
