@@ -42,18 +42,14 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
     ProbeRun first(install.Path(), {}, env);
     ASSERT_TRUE(WaitFor([&] { return std::filesystem::is_socket(socket); }));
     handOver({"early.icc"});
-    handOver({"early2.icc"});
     ASSERT_TRUE(first.WaitForShown());
     // Relative to the later copy's folder, only the first argument, whole and
     // never expanded.
-    const std::string odd = profiles.Path() + "/a*b" + std::string(2000, 'p') + ".icc";
-    handOver({"sub dir/x.icc", "/ignored.icc"});
-    handOver({odd});
+    const std::string odd = "sub dir/a*b" + std::string(2000, 'p') + ".icc";
+    handOver({odd, "/ignored.icc"});
 
     const std::multiset<Args> expected = {{profiles.Path() + "/early.icc"},
-                                          {profiles.Path() + "/early2.icc"},
-                                          {profiles.Path() + "/sub dir/x.icc"},
-                                          {odd}};
+                                          {profiles.Path() + "/" + odd}};
     std::multiset<Args> opened;
     for (const StandinRecord& record : WaitForRecords(log, expected.size()))
         opened.insert(record.args);

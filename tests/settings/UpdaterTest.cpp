@@ -33,12 +33,6 @@ void Write(const std::string& path, const std::string& text)
     std::ofstream(path, std::ios::binary) << text;
 }
 
-std::string Read(const std::string& path)
-{
-    std::ifstream in(path, std::ios::binary);
-    return in ? std::string(std::istreambuf_iterator<char>(in), {}) : "";
-}
-
 TEST(UpdaterTest, ScheduleAndSilentMark)
 {
     using Value = std::optional<std::string>;
@@ -90,7 +84,9 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
             EXPECT_EQ(atLaunch[0].silent, test.atLaunch);
         }
         EXPECT_EQ(all.back().silent, test.fromMenu);
-        EXPECT_EQ(Read(user), test.userAfter.empty() ? test.user : test.userAfter);
+        std::ifstream after(user, std::ios::binary);
+        EXPECT_EQ(std::string(std::istreambuf_iterator<char>(after), {}),
+                  test.userAfter.empty() ? test.user : test.userAfter);
     }
 }
 
