@@ -54,7 +54,7 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
         {kept, "", true, "1", "0", kept},
         {"", "Silent=0\n", true, "1", "0", "Silent=0\n"},
         {"Silent=abc\n", "", true, "abc", "abc", ""},
-        {"Silent=0\nName=\xe9t\xe9\n", "", true, "0", "0", ""}, // not UTF-8: left alone
+        {"Name=\xe9t\xe9\n", "Silent=0\n", true, "0", "0", ""}, // not UTF-8: left alone
     };
     for (const auto& test : cases) {
         SCOPED_TRACE(test.user + "|" + test.system);
