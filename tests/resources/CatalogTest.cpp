@@ -1,5 +1,5 @@
-// Catalogue resources: their memory names, which of them start-up copies, that each
-// translates every text of the sources, and the frame's menus in each language.
+// Catalogue resources: which of them start-up copies, that each translates every
+// text of the sources, and the frame's menus in each language.
 #include "app/UserLanguage.h"
 #include "frame/Veltro3AppFrame.h"
 #include "platform/ResourceImage.h"
@@ -53,14 +53,6 @@ std::vector<std::string> MenuLabels()
 using MenusInLanguage = testing::TestWithParam<std::pair<std::string, bool>>;
 
 } // namespace
-
-TEST(Catalogs, MemoryNamesFollowTheLanguageFolderRules)
-{
-    EXPECT_EQ(CatalogMemoryName("ZH_CN/VELTRO.MO"), "./zh_CN/Veltro.mo");
-    EXPECT_EQ(CatalogMemoryName("JA/SUB/VELTRO.MO"), "./ja/SUB/Veltro.mo");
-    for (const char* name : {"DE/OTHER.MO", "DE/VELTRO.MOVELTRO.MO", "/VELTRO.MO", "VELTRO.MO"})
-        EXPECT_EQ(CatalogMemoryName(name), "") << name;
-}
 
 TEST(Catalogs, OnlyWellFormedCatalogueResourcesAreCopied)
 {
