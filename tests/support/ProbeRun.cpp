@@ -114,7 +114,15 @@ std::vector<ProbeEvent> ProbeRun::Events(const std::string& kind) const
 
 bool ProbeRun::WaitForShown(int timeoutMs) const
 {
-    return WaitFor([this] { return !Events("shown").empty(); }, timeoutMs);
+    // The main frame is the first titled window; the splash before it has no title.
+    return WaitFor(
+        [this] {
+            for (const ProbeEvent& event : Events("shown"))
+                if (!event.fields.empty() && !event.fields[0].empty())
+                    return true;
+            return false;
+        },
+        timeoutMs);
 }
 
 bool ProbeRun::WaitForExit(int timeoutMs, int& status)

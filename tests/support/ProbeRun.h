@@ -45,6 +45,7 @@ public:
     std::vector<ProbeEvent> Events() const;
     std::vector<ProbeEvent> Events(const std::string& kind) const;
 
+    // Until the main frame is shown.
     bool WaitForShown(int timeoutMs = 20000) const;
     // True once the process has ended; its wait status is in `status`.
     bool WaitForExit(int timeoutMs, int& status);

@@ -140,7 +140,7 @@ int Veltro3App::OnExit()
 
 void Veltro3App::OnIdle(wxIdleEvent& event)
 {
-    if (m_initialised && m_deferredStartupPending)
+    if (m_initialised && m_deferredStartupPending && m_frame) // not while the splash yields in OnInit
         RunDeferredStartup();
     event.Skip();
 }
