@@ -9,6 +9,7 @@
 #include <wx/dcclient.h>
 #include <wx/dcmemory.h>
 #include <wx/settings.h>
+#include <wx/time.h>
 #include <wx/utils.h>
 
 #include <algorithm>
@@ -21,6 +22,9 @@ const int kScrollPeriodMs = 80;
 // The lowest rows of the text window show the picture while the text does not wrap.
 const int kPictureRows = 10;
 const int kLargeCharHeight = 16;
+// How long start-up waits for the splash to be mapped and painted; the window manager
+// answers in a few milliseconds.
+const int kFirstPaintWaitMs = 250;
 
 } // namespace
 
@@ -141,6 +145,19 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     // input, so it takes none.
     if (!m_startup && !HasCapture())
         CaptureMouse();
+    if (m_startup)
+        WaitForFirstPaint();
+}
+
+void ZelSplashScreen::WaitForFirstPaint()
+{
+    // Mapping a window is asynchronous on X11: left alone, the splash would first be
+    // painted once start-up has built the main frame, the very wait it is there to cover.
+    const wxLongLong deadline = wxGetLocalTimeMillis() + kFirstPaintWaitMs;
+    while (!m_painted && IsShown() && wxGetLocalTimeMillis() < deadline) {
+        wxMilliSleep(1);
+        wxSafeYield(nullptr, false);
+    }
 }
 
 ZelSplashScreen::~ZelSplashScreen()
@@ -264,6 +281,7 @@ void ZelSplashScreen::OnDeactivate(wxActivateEvent& event)
 void ZelSplashScreen::OnPaint(wxPaintEvent&)
 {
     wxPaintDC dc(this);
+    m_painted = true;
     if (!m_composite.IsOk())
         return;
     for (wxRegionIterator r(GetUpdateRegion()); r; ++r)

@@ -33,6 +33,7 @@ protected:
 private:
     void BlendWithScreen();
     void UpdateText();
+    void WaitForFirstPaint();
 
     void OnTimer(wxTimerEvent& event);
     void OnMouseEvent(wxMouseEvent& event);
@@ -51,6 +52,7 @@ private:
     bool m_startup = false;
     int m_milliseconds = 0;
     int m_scrollOffset = 0;
+    bool m_painted = false;
     wxColour m_colour;
     wxMemoryDC m_compositeDC;
     wxMemoryDC m_backgroundDC;

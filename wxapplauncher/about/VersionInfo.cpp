@@ -1,6 +1,7 @@
 #include "about/VersionInfo.h"
 
 #include "platform/LittleEndian.h"
+#include "platform/ResourceImage.h"
 #include "platform/VersionResource.h"
 
 #include <wx/intl.h>
@@ -8,9 +9,11 @@
 #include <memory>
 #include <stdexcept>
 
-VersionInfo::VersionInfo(const wxString& path)
+namespace {
+
+void ThrowUnlessFound(VersionResourceResult result)
 {
-    switch (ReadVersionResource(std::string(path.fn_str()), m_buffer, m_fixedInfo)) {
+    switch (result) {
     case VersionResourceResult::Found:
         return;
     case VersionResourceResult::Missing:
@@ -19,6 +22,18 @@ VersionInfo::VersionInfo(const wxString& path)
         break;
     }
     throw std::runtime_error("VersionInfo: can not retrieve version information");
+}
+
+} // namespace
+
+VersionInfo::VersionInfo(const wxString& path)
+{
+    ThrowUnlessFound(ReadVersionResource(std::string(path.fn_str()), m_buffer, m_fixedInfo));
+}
+
+VersionInfo::VersionInfo(const ResourceImage& resources)
+{
+    ThrowUnlessFound(ReadVersionResource(resources, m_buffer, m_fixedInfo));
 }
 
 wxString VersionInfo::FormatVersion() const
@@ -33,10 +48,11 @@ wxString VersionInfo::FormatVersion() const
 
 namespace {
 
-wxString FormattedVersionOr(const wxString& path, const wxString& fallback)
+template <typename Source>
+wxString FormattedVersionOr(const Source& source, const wxString& fallback)
 {
     try {
-        return std::make_unique<VersionInfo>(path)->FormatVersion();
+        return std::make_unique<VersionInfo>(source)->FormatVersion();
     } catch (...) {
         return fallback;
     }
@@ -46,8 +62,9 @@ wxString FormattedVersionOr(const wxString& path, const wxString& fallback)
 
 wxString GetLauncherVersion()
 {
-    // "Veltrona.exe" is the running executable, whatever it was started as.
-    return FormattedVersionOr("/proc/self/exe", wxString());
+    // The running executable's resources, whatever it was started as; read before the
+    // splash anyway, so its start costs no second reading of the file.
+    return FormattedVersionOr(ResourceImage::OfExecutable(), wxString());
 }
 
 wxString GetFileVersionString(const wxString& path)

@@ -7,12 +7,16 @@
 #include <cstddef>
 #include <vector>
 
+class ResourceImage;
+
 // The version resource of one file, read once at construction. Throws std::runtime_error
 // when the file or its version resource cannot be read.
 class VersionInfo
 {
 public:
     explicit VersionInfo(const wxString& path);
+    // From resources already in memory: the launcher's own are read once, for its catalogues.
+    explicit VersionInfo(const ResourceImage& resources);
 
     // The product version as four numbers, the last with at least two digits ("3.0.21.07").
     wxString FormatVersion() const;

@@ -2,36 +2,63 @@
 
 #include <gdk/gdk.h>
 #ifdef GDK_WINDOWING_X11
+#include <X11/Xlib.h>
+#include <X11/Xutil.h>
 #include <gdk/gdkx.h>
 #endif
 
-#include <cstring>
+namespace {
 
-// The toolkit's screen device context reads nothing on GTK 3, so GDK reads the root window.
+#ifdef GDK_WINDOWING_X11
+int LowestBit(unsigned long mask)
+{
+    int shift = 0;
+    while (mask && !(mask & 1)) {
+        mask >>= 1;
+        ++shift;
+    }
+    return shift;
+}
+#endif
+
+} // namespace
+
+// The toolkit's screen device context reads nothing on GTK 3, so the root window is read
+// directly: one request to the server, with no intermediate surfaces on the way.
 wxImage CaptureScreen(const wxRect& area)
 {
 #ifdef GDK_WINDOWING_X11
     GdkDisplay* display = gdk_display_get_default();
     if (!display || !GDK_IS_X11_DISPLAY(display) || area.IsEmpty())
         return wxImage();
-    GdkPixbuf* pixbuf = gdk_pixbuf_get_from_window(gdk_get_default_root_window(), area.x, area.y,
-                                                   area.width, area.height);
-    if (!pixbuf)
+    Display* x11 = GDK_DISPLAY_XDISPLAY(display);
+    // An area reaching off the screen is an X error, not a crash.
+    gdk_x11_display_error_trap_push(display);
+    XImage* shot = XGetImage(x11, DefaultRootWindow(x11), area.x, area.y, area.width, area.height,
+                             AllPlanes, ZPixmap);
+    gdk_x11_display_error_trap_pop_ignored(display);
+    if (!shot)
         return wxImage();
     wxImage image;
-    const int channels = gdk_pixbuf_get_n_channels(pixbuf);
-    if (gdk_pixbuf_get_bits_per_sample(pixbuf) == 8 && channels >= 3 &&
-        gdk_pixbuf_get_width(pixbuf) == area.width &&
-        gdk_pixbuf_get_height(pixbuf) == area.height) {
-        image.Create(area.width, area.height, false);
-        const guchar* row = gdk_pixbuf_read_pixels(pixbuf);
-        const int stride = gdk_pixbuf_get_rowstride(pixbuf);
-        unsigned char* out = image.GetData();
-        for (int y = 0; y < area.height; ++y, row += stride)
-            for (int x = 0; x < area.width; ++x, out += 3)
-                std::memcpy(out, row + x * channels, 3);
+    const unsigned long masks[3] = {shot->red_mask, shot->green_mask, shot->blue_mask};
+    // Only 8 bits per channel are taken; other visuals go without the capture.
+    bool eightBits = true;
+    int shifts[3];
+    for (int c = 0; c < 3; ++c) {
+        shifts[c] = LowestBit(masks[c]);
+        eightBits = eightBits && masks[c] >> shifts[c] == 0xFF;
     }
-    g_object_unref(pixbuf);
+    if (eightBits && shot->width == area.width && shot->height == area.height) {
+        image.Create(area.width, area.height, false);
+        unsigned char* out = image.GetData();
+        for (int y = 0; y < area.height; ++y)
+            for (int x = 0; x < area.width; ++x) {
+                const unsigned long pixel = XGetPixel(shot, x, y);
+                for (int c = 0; c < 3; ++c)
+                    *out++ = static_cast<unsigned char>((pixel & masks[c]) >> shifts[c]);
+            }
+    }
+    XDestroyImage(shot);
     return image;
 #else
     (void)area;

@@ -13,18 +13,22 @@ const std::size_t maxVersionBlock = 0xFFFF;
 const std::size_t fixedInfoSize = 52;
 const std::uint32_t fixedInfoSignature = 0xFEEF04BDu;
 
-bool ReadFromElf(const ByteSource& source, std::vector<unsigned char>& block)
+bool CopyVersionBlock(const ResourceImage& image, std::vector<unsigned char>& block)
 {
-    std::vector<unsigned char> section;
-    if (!ReadElfSection(source, ".rsrc", section))
-        return false;
-    const ResourceImage image(std::move(section));
     const ResourceEntry* entry = image.Find(ResourceTypeVersion, versionName);
     if (!entry)
         return false;
     const std::size_t size = entry->size < maxVersionBlock ? entry->size : maxVersionBlock;
     block.assign(entry->data, entry->data + size);
     return true;
+}
+
+bool ReadFromElf(const ByteSource& source, std::vector<unsigned char>& block)
+{
+    std::vector<unsigned char> section;
+    if (!ReadElfSection(source, ".rsrc", section))
+        return false;
+    return CopyVersionBlock(ResourceImage(std::move(section)), block);
 }
 
 } // namespace
@@ -66,6 +70,17 @@ VersionResourceResult ReadVersionResource(const ByteSource& source,
     block.clear();
     if (!ReadPeResource(source, ResourceTypeVersion, versionName, maxVersionBlock, block) &&
         !ReadFromElf(source, block))
+        return VersionResourceResult::Missing;
+    return FindFixedFileInfo(block, fixedInfoOffset) ? VersionResourceResult::Found
+                                                     : VersionResourceResult::Malformed;
+}
+
+VersionResourceResult ReadVersionResource(const ResourceImage& image,
+                                          std::vector<unsigned char>& block,
+                                          std::size_t& fixedInfoOffset)
+{
+    block.clear();
+    if (!CopyVersionBlock(image, block))
         return VersionResourceResult::Missing;
     return FindFixedFileInfo(block, fixedInfoOffset) ? VersionResourceResult::Found
                                                      : VersionResourceResult::Malformed;

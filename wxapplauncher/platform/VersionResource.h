@@ -25,5 +25,11 @@ VersionResourceResult ReadVersionResource(const ByteSource& source,
                                           std::vector<unsigned char>& block,
                                           std::size_t& fixedInfoOffset);
 
+// The same from resources already read, such as the running executable's.
+class ResourceImage;
+VersionResourceResult ReadVersionResource(const ResourceImage& image,
+                                          std::vector<unsigned char>& block,
+                                          std::size_t& fixedInfoOffset);
+
 // Checks the root block of a version resource already in memory.
 bool FindFixedFileInfo(const std::vector<unsigned char>& block, std::size_t& fixedInfoOffset);
