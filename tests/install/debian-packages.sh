@@ -5,10 +5,7 @@ set -euo pipefail
 build="$1"
 work="$(mktemp -d "${TMPDIR:-/tmp}/debian-packages.XXXXXX")"
 trap 'rm -rf "$work"' EXIT
-fail() {
-    echo "FAIL: $*" >&2
-    exit 1
-}
+fail() { echo "FAIL: $*" >&2; exit 1; }
 
 cpack --config "$build/CPackConfig.cmake" -B "$work" >"$work/cpack.log" 2>&1 ||
     { cat "$work/cpack.log"; fail "cpack"; }

@@ -11,10 +11,7 @@ cleanup() {
     rm -rf "$work"
 }
 trap cleanup EXIT
-fail() {
-    echo "FAIL: $*" >&2
-    exit 1
-}
+fail() { echo "FAIL: $*" >&2; exit 1; }
 
 prefix="/opt/Veltrona \"suite\" it's"
 root="$work/dest$prefix"
@@ -31,9 +28,6 @@ for file in applications/veltrona.desktop metainfo/veltrona.metainfo.xml man/man
     [ -f "$root/share/$file" ] || fail "not installed: share/$file"
 done
 [ "$(readlink "$root/bin/veltrona")" = ../lib/veltrona/Veltrona.exe ] || fail "bin/veltrona"
-for file in "$app/Veltrona.exe" "$app/libvaro.so"; do
-    [[ "$(readelf -d "$file")" != *PATH* ]] || fail "$file names a library path of the build"
-done
 desktop-file-validate "$root/share/applications/veltrona.desktop"
 appstreamcli validate --no-net "$root/share/metainfo/veltrona.metainfo.xml" >/dev/null
 
