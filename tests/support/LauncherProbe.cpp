@@ -1,12 +1,18 @@
 // The real launcher with two recorders added, for process-level tests: every
 // modal dialog (answered with OK, never shown) and every top-level window that
-// is shown are appended to the file named by VELTRONA_PROBE_LOG.
+// is shown are appended to the file named by VELTRONA_PROBE_LOG (a dialog that
+// is no message box also with the texts of its controls, one per line). With
+// VELTRONA_PROBE_COMMAND=<id>, the menu command <id> goes to the top window
+// once it is first shown, and its start and end are recorded as "command"
+// events (id, then milliseconds since the probe started).
 #include "app/Veltro3App.h"
 
+#include <wx/app.h>
 #include <wx/eventfilter.h>
 #include <wx/init.h>
 #include <wx/modalhook.h>
 #include <wx/msgdlg.h>
+#include <wx/textctrl.h>
 #include <wx/toplevel.h>
 
 #include <chrono>
@@ -17,6 +23,13 @@
 namespace {
 
 const auto kStart = std::chrono::steady_clock::now();
+
+std::string Elapsed()
+{
+    return std::to_string(std::chrono::duration_cast<std::chrono::milliseconds>(
+                              std::chrono::steady_clock::now() - kStart)
+                              .count());
+}
 
 std::string Escape(const wxString& text)
 {
@@ -56,8 +69,15 @@ protected:
             message = box->GetMessage();
             style = box->GetMessageDialogStyle();
         }
+        wxString controls;
+        for (const wxWindow* child : dialog->GetChildren()) {
+            if (const auto* field = dynamic_cast<const wxTextCtrl*>(child))
+                controls += field->GetValue() + "\n";
+            else if (const auto* control = dynamic_cast<const wxControl*>(child))
+                controls += control->GetLabel() + "\n";
+        }
         Append("dialog\t" + Escape(message) + "\t" + Escape(caption) + "\t" +
-               std::to_string(style));
+               std::to_string(style) + "\t" + Escape(controls));
         return wxID_OK;
     }
 
@@ -65,14 +85,32 @@ protected:
     {
         if (event.GetEventType() == wxEVT_SHOW && static_cast<wxShowEvent&>(event).IsShown()) {
             if (auto* window = dynamic_cast<wxTopLevelWindow*>(event.GetEventObject())) {
-                const auto elapsed = std::chrono::duration_cast<std::chrono::milliseconds>(
-                    std::chrono::steady_clock::now() - kStart);
-                Append("shown\t" + Escape(window->GetTitle()) + "\t" +
-                       std::to_string(elapsed.count()));
+                Append("shown\t" + Escape(window->GetTitle()) + "\t" + Elapsed());
+                if (window == wxTheApp->GetTopWindow())
+                    SendCommandOnce(window);
             }
         }
         return Event_Skip;
     }
+
+private:
+    void SendCommandOnce(wxWindow* window)
+    {
+        const char* id = std::getenv("VELTRONA_PROBE_COMMAND");
+        if (m_commandSent || !id)
+            return;
+        m_commandSent = true;
+        const std::string command = id;
+        window->CallAfter([window, command] {
+            Append("command\t" + command + "\t" + Elapsed());
+            wxCommandEvent event(wxEVT_MENU, std::atoi(command.c_str()));
+            event.SetEventObject(window);
+            window->ProcessWindowEvent(event);
+            Append("command\t" + command + "\t" + Elapsed());
+        });
+    }
+
+    bool m_commandSent = false;
 };
 
 } // namespace

@@ -70,10 +70,10 @@ ProbeRun::~ProbeRun()
     std::remove(m_log.c_str());
 }
 
-std::vector<ProbeEvent> ProbeRun::Events() const
+std::vector<ProbeEvent> ReadEventLog(const std::string& path)
 {
     std::vector<ProbeEvent> events;
-    std::ifstream in(m_log);
+    std::ifstream in(path);
     std::string line;
     while (std::getline(in, line)) {
         ProbeEvent event;
@@ -85,6 +85,11 @@ std::vector<ProbeEvent> ProbeRun::Events() const
         events.push_back(event);
     }
     return events;
+}
+
+std::vector<ProbeEvent> ProbeRun::Events() const
+{
+    return ReadEventLog(m_log);
 }
 
 std::vector<ProbeEvent> ProbeRun::Events(const std::string& kind) const

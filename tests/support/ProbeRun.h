@@ -13,6 +13,10 @@ struct ProbeEvent
     std::vector<std::string> fields; // dialog: message, caption, style; shown: title, ms
 };
 
+// Every line of a log of tab-separated, escaped fields, the first being the kind
+// (the probe's log, the help viewer stand-in's log).
+std::vector<ProbeEvent> ReadEventLog(const std::string& path);
+
 using EnvList = std::vector<std::pair<std::string, std::string>>;
 
 class ProbeRun

@@ -1,4 +1,5 @@
-// The help tool dialog: where the help page of a window is expected, and whether it is there.
+// The help tool: shows, modally, where the help page of a window is expected
+// and whether it is there.
 #pragma once
 
 #include <wx/string.h>

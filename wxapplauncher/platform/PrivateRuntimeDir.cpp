@@ -9,8 +9,9 @@
 wxString GetPrivateRuntimeDir()
 {
     const char* runtime = std::getenv("XDG_RUNTIME_DIR");
-    std::string dir = runtime && *runtime ? std::string(runtime) + "/veltrona"
-                                          : "/tmp/veltrona-" + std::to_string(getuid());
+    // A relative XDG_RUNTIME_DIR is invalid and would follow the working directory.
+    std::string dir = runtime && *runtime == '/' ? std::string(runtime) + "/veltrona"
+                                                 : "/tmp/veltrona-" + std::to_string(getuid());
     if (mkdir(dir.c_str(), 0700) != 0 && errno != EEXIST)
         return wxString();
 
