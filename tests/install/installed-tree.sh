@@ -69,7 +69,8 @@ menu_open() {
     [ "$(xdotool search --onlyvisible --pid "$launcher" --name '' | wc -l)" -gt 1 ]
 }
 
-# The launcher started through the link, from elsewhere, finds the modules beside it.
+# The launcher started through the link, from elsewhere, finds the modules and the help
+# viewer beside it.
 (cd / && exec veltrona) &
 find_launcher
 class="$(xprop -id "$window" WM_CLASS | sed -n 's/.*, "\(.*\)"$/\1/p')"
@@ -79,6 +80,10 @@ xdotool windowactivate --sync "$window" key alt+f
 wait_until menu_open || fail "the File menu did not open"
 xdotool key Return
 wait_until started "Quenta Print Studio.exe" || fail "File > Printer started nothing"
+xdotool key F1
+wait_until started "Help/Veltrona Help.exe" || fail "F1 did not start the help viewer"
+viewer="$(timeout 30 xdotool search --sync --onlyvisible --name '^Veltrona Help$' | head -n 1)"
+wmctrl -i -c "$viewer"
 close_launcher
 
 # A profile opened the way a file manager opens it reaches the Inspect module whole.
