@@ -35,6 +35,8 @@ packages=(
     xdg-utils
     libglib2.0-bin
     shared-mime-info
+    xdg-utils
+    file
 )
 
 missing=()

@@ -28,13 +28,16 @@ std::string EscapeField(const std::string& text)
     return out;
 }
 
-std::string FormatRecord(const std::vector<std::string>& argv, long pid, const std::string& cwd)
+std::string FormatRecord(const std::vector<std::string>& argv, long pid, const std::string& cwd,
+                         const std::vector<std::pair<std::string, std::string>>& extra)
 {
     std::string record = "exe\t" + EscapeField(argv.empty() ? std::string() : argv.front()) + "\n";
     record += "pid\t" + std::to_string(pid) + "\n";
     record += "cwd\t" + EscapeField(cwd) + "\n";
     for (size_t i = 1; i < argv.size(); ++i)
         record += "arg\t" + EscapeField(argv[i]) + "\n";
+    for (const auto& [key, value] : extra)
+        record += key + "\t" + EscapeField(value) + "\n";
     record += "end\n";
     return record;
 }

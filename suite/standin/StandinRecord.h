@@ -3,6 +3,7 @@
 #pragma once
 
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace standin {
@@ -10,7 +11,9 @@ namespace standin {
 // Backslash, newline and tab become two-character escapes; nothing else changes.
 std::string EscapeField(const std::string& text);
 
-std::string FormatRecord(const std::vector<std::string>& argv, long pid, const std::string& cwd);
+// `extra` lines ("key<TAB>value") go before the record's end.
+std::string FormatRecord(const std::vector<std::string>& argv, long pid, const std::string& cwd,
+                         const std::vector<std::pair<std::string, std::string>>& extra = {});
 
 // The working directory, or an empty string when it cannot be read.
 std::string CurrentDirectory();

@@ -2,6 +2,7 @@
 // unless told to exit at once, shows a window until it is closed.
 #include "StandinRecord.h"
 #include "StandinWindow.h"
+#include "UpdaterSettings.h"
 
 #include <cstdio>
 #include <cstdlib>
@@ -29,8 +30,14 @@ int main(int argc, char** argv)
     std::vector<std::string> arguments(argv, argv + argc);
 
     if (const char* log = Env("VELTRONA_STANDIN_LOG")) {
+        // The updater also tells how the launcher marked its start.
+        std::vector<std::pair<std::string, std::string>> extra;
+        if (!arguments.empty() && BaseName(arguments.front()) == "Quenta Updater.exe") {
+            if (auto silent = standin::FindSilentSetting())
+                extra.emplace_back("silent", *silent);
+        }
         std::string record = standin::FormatRecord(arguments, static_cast<long>(getpid()),
-                                                   standin::CurrentDirectory());
+                                                   standin::CurrentDirectory(), extra);
         if (!standin::AppendRecord(log, record))
             std::fprintf(stderr, "cannot append the start record to %s\n", log);
     }

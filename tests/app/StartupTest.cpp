@@ -10,6 +10,9 @@
 #include <wx/defs.h>
 
 #include <cstdlib>
+#include <filesystem>
+#include <memory>
+#include <set>
 #include <sys/stat.h>
 #include <sys/wait.h>
 
@@ -63,20 +66,66 @@ TEST_F(StartupTest, ScreenOfAtLeast1024By768IsRequired)
     EXPECT_TRUE(accepted.Events("dialog").empty());
 }
 
-TEST_F(StartupTest, FrameShowsAfterTheSplashTimeAndOpensTheFirstArgument)
+// Found through PATH, through a link elsewhere, or by its path: the launcher
+// works from its own folder, and a relative file is the caller's.
+TEST_F(StartupTest, WorksFromItsOwnFolderAndOpensTheCallersFile)
 {
-    const std::string file = m_install.Path() + "/my profile.icc";
-    ProbeRun launcher(m_install.Path(), {file, "/ignored/second.icc"}, Env());
-    ASSERT_TRUE(launcher.WaitForShown());
-    const auto shown = launcher.Events("shown");
-    EXPECT_EQ(shown[0].fields[0], "Veltrona");
-    EXPECT_GE(std::stol(shown[0].fields[1]), 2000);
+    const std::string install = m_install.Path();
+    StandinDir profiles({}), links({});
+    using Args = std::vector<std::string>;
+    const struct
+    {
+        ProbeStart start;
+        Args args;
+        Args opened; // Inspect's arguments; none when nothing opens
+    } cases[] = {
+        {{install + "/Veltrona.exe", "Veltrona.exe", profiles.Path()},
+         {"x.icc"},
+         {profiles.Path() + "/x.icc"}},
+        {{links.Path() + "/veltrona", "", profiles.Path()},
+         {"./a b/\"c\".icc", "second.icc"},
+         {profiles.Path() + "/a b/\"c\".icc"}},
+        {{"", "", profiles.Path()}, {"\xff\xfe.icc", "second.icc"}, {}},
+    };
 
-    const auto records = WaitForRecords(m_install.Path() + "/starts.log", 1, 10000);
-    ASSERT_EQ(records.size(), 1u);
-    EXPECT_EQ(records[0].exe, m_install.Path() + "/Quenta Inspect Studio.exe");
-    EXPECT_EQ(records[0].args, std::vector<std::string>{file});
-    EXPECT_EQ(records[0].cwd, m_install.Path());
+    std::vector<std::unique_ptr<StandinDir>> runtimes;
+    std::vector<std::unique_ptr<ProbeRun>> runs;
+    for (const auto& c : cases) {
+        runtimes.push_back(std::make_unique<StandinDir>(std::vector<std::string>{}));
+        chmod(runtimes.back()->Path().c_str(), 0700);
+        EnvList env = Env();
+        env[0].second = runtimes.back()->Path();
+        env.emplace_back("PATH", install + ":" + std::getenv("PATH"));
+        runs.push_back(std::make_unique<ProbeRun>(install, c.args, env, c.start));
+        std::error_code exists;
+        std::filesystem::create_symlink(install + "/Veltrona.exe", links.Path() + "/veltrona",
+                                        exists);
+    }
+    std::multiset<Args> expected;
+    for (size_t i = 0; i < runs.size(); ++i) {
+        ASSERT_TRUE(runs[i]->WaitForShown()) << i;
+        // The untitled start-up splash first, the frame no earlier than 2000 ms after it.
+        const auto shown = runs[i]->Events("shown");
+        ASSERT_EQ(shown.size(), 2u) << i;
+        EXPECT_EQ(shown[0].fields[0], "");
+        EXPECT_EQ(shown[1].fields[0], "Veltrona");
+        EXPECT_GE(std::stol(shown[1].fields[1]) - std::stol(shown[0].fields[1]), 2000);
+        unsigned long frame = 0;
+        ASSERT_TRUE(WaitFor([&] { return (frame = WindowOf(runs[i]->Pid(), "Veltrona")) != 0; }));
+        CloseWindow(frame);
+        int status = 0;
+        ASSERT_TRUE(runs[i]->WaitForExit(10000, status)) << i;
+        if (!cases[i].opened.empty())
+            expected.insert(cases[i].opened);
+    }
+
+    std::multiset<Args> opened;
+    for (const StandinRecord& record : SettledRecords(install + "/starts.log")) {
+        EXPECT_EQ(record.exe, install + "/Quenta Inspect Studio.exe");
+        EXPECT_EQ(record.cwd, install);
+        opened.insert(record.args);
+    }
+    EXPECT_EQ(opened, expected);
 }
 
 TEST_F(StartupTest, CloseBoxEndsTheLauncher)

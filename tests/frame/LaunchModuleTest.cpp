@@ -1,5 +1,6 @@
 // Module launching through the File menu, the view's buttons, the Inspect drop
 // target and OpenInInspect, observed from the stand-ins' start records.
+#include "app/UserLanguage.h"
 #include "frame/DragNDrop.h"
 #include "frame/ModuleCatalog.h"
 #include "frame/Veltro3AppFrame.h"
@@ -142,36 +143,32 @@ TEST_F(LaunchModuleTest, NothingStartsAndNothingShowsWhenThereIsNothingToStart)
     EXPECT_TRUE(dialogs.Dialogs().empty());
 }
 
-TEST_F(LaunchModuleTest, VerifyGetsTheWindowsLanguageNumber)
+// From the user's locale as start-up reads it; ja.UTF-8 and de_XX are not
+// installed, and still name Japanese and German.
+TEST_F(LaunchModuleTest, VerifyGetsTheWindowsNumberOfTheUsersLanguage)
 {
     Install(kAllModules);
     const struct
     {
-        wxLanguage language;
+        const char* lang;
         int number;
     } cases[] = {
-        {wxLANGUAGE_ENGLISH_US, 1033},
-        {wxLANGUAGE_ENGLISH_UK, 2057},
-        {wxLANGUAGE_PORTUGUESE_BRAZILIAN, 1046},
-        {wxLANGUAGE_PORTUGUESE, 1033},
-        {wxLANGUAGE_KOREAN, 1033},
-        {wxLANGUAGE_GERMAN_AUSTRIAN, 1031},
-        {wxLANGUAGE_FRENCH_CANADIAN, 1036},
-        {wxLANGUAGE_DUTCH_BELGIAN, 1043},
-        {wxLANGUAGE_ITALIAN_SWISS, 1040},
-        {wxLANGUAGE_SPANISH_MEXICAN, 1034},
-        {wxLANGUAGE_JAPANESE, 1041},
-        {wxLANGUAGE_CHINESE_SIMPLIFIED, 2052},
-        {wxLANGUAGE_CHINESE_TRADITIONAL, 1033},
+        {"it_IT", 1040}, {"ja_JP", 1041}, {"ja", 1041},    {"it_CH", 1040}, {"de_DE", 1031},
+        {"de_AT", 1031}, {"nl_NL", 1043}, {"nl_BE", 1043}, {"fr_FR", 1036}, {"fr_CA", 1036},
+        {"es_ES", 1034}, {"es_MX", 1034}, {"en_GB", 2057}, {"en_US", 1033}, {"pt_BR", 1046},
+        {"pt_PT", 1033}, {"ko_KR", 1033}, {"zh_CN", 2052}, {"zh_TW", 1033}, {"de_XX", 1031},
+        {"C", 1033},
     };
+    for (const char* name : {"LANGUAGE", "LC_ALL", "LC_MESSAGES"})
+        unsetenv(name);
     for (const auto& c : cases) {
-        wxLocale locale;
-        locale.Init(c.language, wxLOCALE_DONT_LOAD_DEFAULT);
-        EXPECT_EQ(GetModuleLanguageId(), c.number) << wxLocale::GetLanguageName(c.language);
+        setenv("LANG", (c.lang + std::string(".UTF-8")).c_str(), 1);
+        DecideUserLanguage();
+        EXPECT_EQ(GetModuleLanguageId(), c.number) << c.lang;
     }
 
-    wxLocale british;
-    british.Init(wxLANGUAGE_ENGLISH_UK, wxLOCALE_DONT_LOAD_DEFAULT);
+    setenv("LANG", "en_GB.UTF-8", 1);
+    DecideUserLanguage();
     Click(1105);
     const auto records = WaitForRecords(m_log, 1);
     ASSERT_EQ(records.size(), 1u);

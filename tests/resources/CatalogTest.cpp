@@ -1,5 +1,6 @@
 // Catalogue resources: their memory names, which of them start-up copies, that each
 // translates every text of the sources, and the frame's menus in each language.
+#include "app/UserLanguage.h"
 #include "frame/Veltro3AppFrame.h"
 #include "platform/ResourceImage.h"
 #include "resources/CatalogFormat.h"
@@ -125,10 +126,8 @@ TEST_P(MenusInLanguage, FileAndHelpMenusAreTranslated)
     setenv("LANG", (GetParam().substr(0, 5) + ".UTF-8").c_str(), 1);
     // Start-up's steps.
     wxLocale locale;
-    const wxLanguage language = wxLanguage(wxLocale::GetSystemLanguage());
-    if (language != wxLANGUAGE_UNKNOWN)
-        locale.Init(language, wxLOCALE_LOAD_DEFAULT);
-    PrepareTranslations(locale, language);
+    DecideUserLanguage();
+    InitLocale(locale);
     wxFileSystem::AddHandler(new wxMemoryFSHandler);
     LoadCatalogResources();
     wxLocale::AddCatalogLookupPathPrefix("memory:.");

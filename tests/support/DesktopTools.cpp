@@ -29,7 +29,7 @@ unsigned long ActiveWindow()
 
 unsigned long WindowOf(pid_t pid, const std::string& title)
 {
-    return std::strtoul(Capture("xdotool search --onlyvisible --pid " + std::to_string(pid) +
+    return std::strtoul(Capture("xdotool search --all --onlyvisible --pid " + std::to_string(pid) +
                                 " --name '^" + title + "$' 2>/dev/null")
                             .c_str(),
                         nullptr, 10);
@@ -38,4 +38,15 @@ unsigned long WindowOf(pid_t pid, const std::string& title)
 void CloseWindow(unsigned long window)
 {
     std::system(("wmctrl -i -c " + std::to_string(window)).c_str());
+}
+
+void MinimiseWindow(unsigned long window)
+{
+    std::system(("xdotool windowminimize " + std::to_string(window)).c_str());
+}
+
+bool IsMinimised(unsigned long window)
+{
+    return Capture("xprop -id " + std::to_string(window) + " WM_STATE 2>/dev/null")
+               .find("Iconic") != std::string::npos;
 }

@@ -13,3 +13,9 @@ unsigned long WindowOf(pid_t pid, const std::string& title);
 
 // Asks the window manager to close the window, as its close box does.
 void CloseWindow(unsigned long window);
+
+// Minimises the window as its title bar's button does, through the window manager.
+void MinimiseWindow(unsigned long window);
+
+// True while the window is minimised (its WM_STATE is Iconic).
+bool IsMinimised(unsigned long window);

@@ -1,11 +1,13 @@
 // Sees every modal dialog, message boxes included, records it and answers it
-// with OK without showing it.
+// without showing it: with OK, or with what the test's answer function says.
 #pragma once
 
 #include <wx/modalhook.h>
 #include <wx/msgdlg.h>
 #include <wx/string.h>
 
+#include <functional>
+#include <utility>
 #include <vector>
 
 struct RecordedDialog
@@ -18,7 +20,10 @@ struct RecordedDialog
 class DialogRecorder : public wxModalDialogHook
 {
 public:
-    DialogRecorder() { Register(); }
+    explicit DialogRecorder(std::function<int(wxDialog*)> answer = {}) : m_answer(std::move(answer))
+    {
+        Register();
+    }
 
     const std::vector<RecordedDialog>& Dialogs() const { return m_dialogs; }
 
@@ -32,9 +37,10 @@ protected:
             record.style = box->GetMessageDialogStyle();
         }
         m_dialogs.push_back(record);
-        return wxID_OK;
+        return m_answer ? m_answer(dialog) : wxID_OK;
     }
 
 private:
+    std::function<int(wxDialog*)> m_answer;
     std::vector<RecordedDialog> m_dialogs;
 };

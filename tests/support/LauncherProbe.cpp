@@ -9,6 +9,7 @@
 
 #include <wx/app.h>
 #include <wx/eventfilter.h>
+#include <wx/frame.h>
 #include <wx/init.h>
 #include <wx/modalhook.h>
 #include <wx/msgdlg.h>
@@ -86,7 +87,9 @@ protected:
         if (event.GetEventType() == wxEVT_SHOW && static_cast<wxShowEvent&>(event).IsShown()) {
             if (auto* window = dynamic_cast<wxTopLevelWindow*>(event.GetEventObject())) {
                 Append("shown\t" + Escape(window->GetTitle()) + "\t" + Elapsed());
-                if (window == wxTheApp->GetTopWindow())
+                // The main frame, not the start-up splash shown before it.
+                auto* frame = dynamic_cast<wxFrame*>(window);
+                if (frame && frame->GetMenuBar() && window == wxTheApp->GetTopWindow())
                     SendCommandOnce(window);
             }
         }
@@ -120,7 +123,9 @@ int main(int argc, char** argv)
     Recorder recorder;
     recorder.Register();
     wxEvtHandler::AddFilter(&recorder);
-    wxApp::SetInstance(new Veltro3App);
+    // Created where the launcher's own entry point creates it, after the
+    // toolkit has read the command line.
+    wxApp::SetInitializerFunction([]() -> wxAppConsole* { return new Veltro3App; });
     const int result = wxEntry(argc, argv);
     wxEvtHandler::RemoveFilter(&recorder);
     return result;

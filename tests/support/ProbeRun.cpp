@@ -10,6 +10,7 @@
 #include <fstream>
 #include <spawn.h>
 #include <sstream>
+#include <sys/prctl.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -22,13 +23,17 @@ int g_probeCount = 0;
 } // namespace
 
 ProbeRun::ProbeRun(const std::string& installDir, const std::vector<std::string>& args,
-                   const EnvList& env)
+                   const EnvList& env, const ProbeStart& start)
 {
     namespace fs = std::filesystem;
     const fs::path launcher = fs::path(installDir) / "Veltrona.exe";
-    std::error_code ignored;
-    if (!fs::exists(launcher))
-        fs::create_symlink(VELTRONA_PROBE_PATH, launcher, ignored);
+    std::error_code failed;
+    if (!fs::exists(launcher)) {
+        fs::create_hard_link(VELTRONA_PROBE_PATH, launcher, failed);
+        if (failed)
+            fs::copy_file(VELTRONA_PROBE_PATH, launcher, failed);
+    }
+    prctl(PR_SET_CHILD_SUBREAPER, 1);
 
     m_log = installDir + "/probe-" + std::to_string(getpid()) + "-" +
             std::to_string(++g_probeCount) + ".log";
@@ -46,7 +51,8 @@ ProbeRun::ProbeRun(const std::string& installDir, const std::vector<std::string>
     for (const auto& [name, value] : env)
         environment.push_back(name + "=" + value);
 
-    std::vector<std::string> argvStrings = {launcher.string()};
+    const std::string program = start.program.empty() ? launcher.string() : start.program;
+    std::vector<std::string> argvStrings = {start.argv0.empty() ? program : start.argv0};
     argvStrings.insert(argvStrings.end(), args.begin(), args.end());
     std::vector<char*> argvPointers, envPointers;
     for (std::string& s : argvStrings)
@@ -56,9 +62,14 @@ ProbeRun::ProbeRun(const std::string& installDir, const std::vector<std::string>
         envPointers.push_back(s.data());
     envPointers.push_back(nullptr);
 
-    if (posix_spawn(&m_pid, argvPointers[0], nullptr, nullptr, argvPointers.data(),
+    posix_spawn_file_actions_t actions;
+    posix_spawn_file_actions_init(&actions);
+    if (!start.cwd.empty())
+        posix_spawn_file_actions_addchdir_np(&actions, start.cwd.c_str());
+    if (posix_spawn(&m_pid, program.c_str(), &actions, nullptr, argvPointers.data(),
                     envPointers.data()) != 0)
         m_pid = -1;
+    posix_spawn_file_actions_destroy(&actions);
 }
 
 ProbeRun::~ProbeRun()
@@ -103,7 +114,15 @@ std::vector<ProbeEvent> ProbeRun::Events(const std::string& kind) const
 
 bool ProbeRun::WaitForShown(int timeoutMs) const
 {
-    return WaitFor([this] { return !Events("shown").empty(); }, timeoutMs);
+    // The main frame is the first titled window; the splash before it has no title.
+    return WaitFor(
+        [this] {
+            for (const ProbeEvent& event : Events("shown"))
+                if (!event.fields.empty() && !event.fields[0].empty())
+                    return true;
+            return false;
+        },
+        timeoutMs);
 }
 
 bool ProbeRun::WaitForExit(int timeoutMs, int& status)

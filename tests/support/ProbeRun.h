@@ -19,13 +19,24 @@ std::vector<ProbeEvent> ReadEventLog(const std::string& path);
 
 using EnvList = std::vector<std::pair<std::string, std::string>>;
 
+// How the launcher is started, when not by its full path from the test's own
+// working directory.
+struct ProbeStart
+{
+    std::string program; // the file run; default <installDir>/Veltrona.exe
+    std::string argv0;   // what it is told its name is; default `program`
+    std::string cwd;     // where it starts
+};
+
 class ProbeRun
 {
 public:
-    // Runs `<installDir>/Veltrona.exe`, a link to the probe, with `args` and
-    // the test's environment plus `env`.
+    // Runs `<installDir>/Veltrona.exe`, the probe (a hard link, so that the
+    // launcher finds itself there), with `args` and the test's environment plus
+    // `env`. Stand-ins it starts become children of the test once it ends, so
+    // SettledRecords waits for them too.
     ProbeRun(const std::string& installDir, const std::vector<std::string>& args,
-             const EnvList& env = {});
+             const EnvList& env = {}, const ProbeStart& start = {});
     ~ProbeRun();
     ProbeRun(const ProbeRun&) = delete;
     ProbeRun& operator=(const ProbeRun&) = delete;
@@ -34,6 +45,7 @@ public:
     std::vector<ProbeEvent> Events() const;
     std::vector<ProbeEvent> Events(const std::string& kind) const;
 
+    // Until the main frame is shown.
     bool WaitForShown(int timeoutMs = 20000) const;
     // True once the process has ended; its wait status is in `status`.
     bool WaitForExit(int timeoutMs, int& status);

@@ -33,13 +33,15 @@ std::vector<StandinRecord> ReadRecords(const std::string& path)
         const std::string key = line.substr(0, tab);
         const std::string value = tab == line.npos ? "" : UnescapeField(line.substr(tab + 1));
         if (key == "exe")
-            record = {value, 0, "", {}};
+            record = {value, 0, "", {}, std::nullopt};
         else if (key == "pid")
             record.pid = std::atoi(value.c_str());
         else if (key == "cwd")
             record.cwd = value;
         else if (key == "arg")
             record.args.push_back(value);
+        else if (key == "silent")
+            record.silent = value;
         else if (key == "end")
             records.push_back(record);
     }

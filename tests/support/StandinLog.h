@@ -2,6 +2,7 @@
 // test can see exactly which program was started, where and with what.
 #pragma once
 
+#include <optional>
 #include <string>
 #include <sys/types.h>
 #include <vector>
@@ -11,7 +12,8 @@ struct StandinRecord
     std::string exe; // argv[0] as the stand-in received it
     pid_t pid = 0;
     std::string cwd;
-    std::vector<std::string> args; // the arguments after argv[0]
+    std::vector<std::string> args;     // the arguments after argv[0]
+    std::optional<std::string> silent; // the updater only: the "Silent" it found
 };
 
 // A field of a record line: \\, \n and \t stand for a backslash, a line

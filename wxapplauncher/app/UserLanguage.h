@@ -2,7 +2,19 @@
 // matters: the catalogues, Verify's language number and the help folder.
 #pragma once
 
+#include <wx/intl.h>
 #include <wx/string.h>
+
+// Takes the decision from the environment (LC_ALL, LC_MESSAGES, LANG) and keeps it
+// for the run. A locale that is not installed still counts: "de_XX" is German.
+void DecideUserLanguage();
+
+// The decided language's toolkit value; wxLANGUAGE_UNKNOWN when none is known.
+// Before start-up decided, both read the environment afresh.
+wxLanguage GetUserLanguage();
 
 // The canonical name of the user's language ("de_DE", "ja", "pt_BR"); empty when unknown.
 wxString GetUserLanguageName();
+
+// True when the system has the user's locale installed, so the C library can use it.
+bool IsUserLocaleInstalled();

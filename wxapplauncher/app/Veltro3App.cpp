@@ -1,11 +1,14 @@
 #include "app/Veltro3App.h"
 
 #include "about/Splash.h"
+#include "app/CommandLineFile.h"
+#include "app/HandOver.h"
+#include "app/UserLanguage.h"
+#include "app/Veltro3AppLauncherIPC.h"
 #include "frame/Veltro3AppFrame.h"
 #include "help/CContextualHelp.h"
 #include "help/HelpTool.h"
 #include "platform/InstanceLock.h"
-#include "platform/PrivateRuntimeDir.h"
 #include "resources/Catalogs.h"
 #include "settings/UpdateCheck.h"
 
@@ -14,7 +17,7 @@
 #include <wx/filesys.h>
 #include <wx/fs_mem.h>
 #include <wx/log.h>
-#include <wx/snglinst.h>
+#include <wx/stdpaths.h>
 #include <wx/timer.h>
 #include <wx/utils.h>
 
@@ -23,9 +26,13 @@ const int kSplashMilliseconds = 2000;
 const int kMinimumResolutionPreset = 1;
 } // namespace
 
-wxBEGIN_EVENT_TABLE(Veltro3App, wxApp) EVT_IDLE(Veltro3App::OnIdle) wxEND_EVENT_TABLE()
+// clang-format off
+wxBEGIN_EVENT_TABLE(Veltro3App, wxApp)
+    EVT_IDLE(Veltro3App::OnIdle)
+wxEND_EVENT_TABLE()
+// clang-format on
 
-    Veltro3App* GetVeltro3App()
+Veltro3App* GetVeltro3App()
 {
     return dynamic_cast<Veltro3App*>(wxTheApp);
 }
@@ -57,14 +64,16 @@ bool Veltro3App::OnInit()
     m_singleInstanceChecker = nullptr;
     m_splashTimer = new wxTimer;
 
-    const wxLanguage language = static_cast<wxLanguage>(wxLocale::GetSystemLanguage());
-    // A locale that is not installed reads as unknown; the texts then stay English.
-    if (language != wxLANGUAGE_UNKNOWN)
-        m_locale.Init(language, wxLOCALE_LOAD_DEFAULT);
-    PrepareTranslations(m_locale, language);
+    // Relative paths on the command line name files where the caller stood.
+    m_commandLineFile = CommandLineFile(argv, argc, wxGetCwd());
 
-    const wxString launcherDir =
-        wxFileName(argv[0], wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR);
+    DecideUserLanguage();
+    InitLocale(m_locale);
+
+    // The running executable, not argv[0]: that is a bare name when the
+    // launcher is found through PATH, or the path of a link to it.
+    const wxString launcherDir = wxFileName(wxStandardPaths::Get().GetExecutablePath())
+                                     .GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR);
 
     wxFileSystem::AddHandler(new wxMemoryFSHandler);
     LoadCatalogResources();
@@ -77,15 +86,21 @@ bool Veltro3App::OnInit()
         return false;
 
     const wxString instanceName = GetVendorName() + "." + GetAppName() + "." + wxGetUserId();
-    const wxString lockDir = GetPrivateRuntimeDir();
-    RemoveStaleInstanceLock(lockDir, instanceName);
-    m_singleInstanceChecker = new wxSingleInstanceChecker;
-    m_singleInstanceChecker->Create(instanceName, lockDir);
+    m_singleInstanceChecker = new InstanceLock;
+    m_singleInstanceChecker->Create(instanceName);
 
+    const wxString serviceName = instanceName + ".ipc";
     if (m_singleInstanceChecker->IsAnotherRunning()) {
+        HandOverToRunningCopy(serviceName, m_commandLineFile);
         // The toolkit does not call OnExit after a failed OnInit.
         OnExit();
         return false;
+    }
+
+    m_launcherServer = new Veltro3AppLauncherIPCServer;
+    if (!m_launcherServer->Create(serviceName)) {
+        delete m_launcherServer;
+        m_launcherServer = nullptr;
     }
 
     ShowSplash(true, kSplashMilliseconds);
@@ -94,6 +109,12 @@ bool Veltro3App::OnInit()
     m_frame = new Veltro3AppFrame(_("Veltrona"), wxDefaultPosition, wxDefaultSize);
     m_frame->Centre(wxBOTH);
     SetTopWindow(m_frame);
+    // The toolkit destroys the frame; nothing may reach it afterwards.
+    m_frame->Bind(wxEVT_DESTROY, [this](wxWindowDestroyEvent& event) {
+        if (event.GetEventObject() == m_frame)
+            m_frame = nullptr;
+        event.Skip();
+    });
 
     m_contextualHelp = new CContextualHelp(GetAppName());
     m_contextualHelp->Start();
@@ -106,16 +127,20 @@ int Veltro3App::OnExit()
         wxTheClipboard->Flush();
     delete m_splashTimer;
     m_splashTimer = nullptr;
-    delete m_singleInstanceChecker;
-    m_singleInstanceChecker = nullptr;
+    // The services go before the lock: a copy that takes the lock next finds
+    // none of our sockets, and its own are never removed by us.
+    delete m_launcherServer;
+    m_launcherServer = nullptr;
     delete m_contextualHelp;
     m_contextualHelp = nullptr;
+    delete m_singleInstanceChecker;
+    m_singleInstanceChecker = nullptr;
     return 0;
 }
 
 void Veltro3App::OnIdle(wxIdleEvent& event)
 {
-    if (m_initialised && m_deferredStartupPending)
+    if (m_initialised && m_deferredStartupPending && m_frame) // not while the splash yields in OnInit
         RunDeferredStartup();
     event.Skip();
 }
@@ -133,25 +158,31 @@ void Veltro3App::RunDeferredStartup()
 
     CheckForUpdateAtLaunch();
 
+    if (!m_frame)
+        return;
     m_frame->Raise();
     m_frame->Show();
 
-    if (argc > 1)
-        m_pendingFile = argv[1];
-    if (!m_pendingFile.empty() && m_frame) {
-        const wxString path = m_pendingFile;
-        m_pendingFile.clear();
-        m_frame->OpenInInspect(path);
-    }
+    // The launcher's own file first, then those later copies sent meanwhile.
+    if (!m_commandLineFile.empty())
+        m_queuedFiles.Insert(m_commandLineFile, 0);
+    OpenPendingFile();
 }
 
 void Veltro3App::OpenPendingFile()
 {
-    if (m_pendingFile.empty() || m_deferredStartupPending || !m_frame)
+    // Paths that arrive before the frame shows wait in order; none replaces another.
+    if (!m_pendingFile.empty()) {
+        m_queuedFiles.Add(m_pendingFile);
+        m_pendingFile.clear();
+    }
+    if (m_deferredStartupPending)
         return;
-    const wxString path = m_pendingFile;
-    m_pendingFile.clear();
-    m_frame->OpenInInspect(path);
+    while (!m_queuedFiles.empty() && m_frame && m_frame->IsShown()) {
+        const wxString path = m_queuedFiles[0];
+        m_queuedFiles.RemoveAt(0);
+        m_frame->OpenInInspect(path);
+    }
 }
 
 void Veltro3App::ShowContextHelp(const wxString& page)

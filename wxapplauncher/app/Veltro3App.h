@@ -3,11 +3,12 @@
 #pragma once
 
 #include <wx/app.h>
+#include <wx/arrstr.h>
 #include <wx/intl.h>
 #include <wx/string.h>
 
 class wxIdleEvent;
-class wxSingleInstanceChecker;
+class InstanceLock;
 class wxTimer;
 class CContextualHelp;
 class Veltro3AppLauncherIPCServer;
@@ -35,13 +36,18 @@ public:
     bool m_initialised;
     bool m_deferredStartupPending;
     Veltro3AppLauncherIPCServer* m_launcherServer;
-    wxSingleInstanceChecker* m_singleInstanceChecker;
+    InstanceLock* m_singleInstanceChecker;
     wxTimer* m_splashTimer;
     wxLocale m_locale;
     wxString m_pendingFile;
     Veltro3AppFrame* m_frame;
+    // Paths to open once the frame shows, oldest first.
+    wxArrayString m_queuedFiles;
 
 private:
+    // The first command-line argument, absolute; empty when it cannot be used.
+    wxString m_commandLineFile;
+
     wxDECLARE_EVENT_TABLE();
 };
 

@@ -2,15 +2,28 @@
 
 #include "frame/Ids.h"
 
+#include <wx/intl.h>
+
 namespace {
 
+// Labels are catalogue keys, translated where they are shown.
 const ModuleInfo kModules[] = {
-    {ID_MODULE_PRINTER, "Quenta Print Studio", "Quenta Print Studio.exe"},
-    {ID_MODULE_MONITOR, "Zel Display Studio", "Monitor/Zel Display Studio.exe"},
-    {ID_MODULE_DEVICELINK, "Quenta Link Studio", "Quenta Link Studio.exe"},
-    {ID_MODULE_VERIFY, "Zel Verify Studio", "ZelVerifyStudio.exe"},
-    {ID_MODULE_INSPECT, "Quenta Inspect Studio", "Quenta Inspect Studio.exe"},
-    {ID_MODULE_EDIT, "Quenta Edit Studio", "Quenta Edit Studio.exe"},
+    {ID_MODULE_PRINTER, wxTRANSLATE("Quenta Print Studio"), "Quenta Print Studio.exe",
+     ID_BUTTON_PRINTER, wxTRANSLATE("Printer"), wxTRANSLATE("Create &Printer Profile..."),
+     ID_ABOUT_PRINTER},
+    {ID_MODULE_MONITOR, wxTRANSLATE("Zel Display Studio"), "Monitor/Zel Display Studio.exe",
+     ID_BUTTON_MONITOR, wxTRANSLATE("Monitor"), wxTRANSLATE("Create &Monitor Profile..."),
+     ID_ABOUT_MONITOR},
+    {ID_MODULE_DEVICELINK, wxTRANSLATE("Quenta Link Studio"), "Quenta Link Studio.exe",
+     ID_BUTTON_DEVICELINK, wxTRANSLATE("Device Link"),
+     wxTRANSLATE("Create &Device Link Profile..."), ID_ABOUT_DEVICELINK},
+    {ID_MODULE_VERIFY, wxTRANSLATE("Zel Verify Studio"), "ZelVerifyStudio.exe", ID_BUTTON_VERIFY,
+     wxTRANSLATE("Verify"), wxTRANSLATE("&Verify Color..."), ID_ABOUT_VERIFY},
+    {ID_MODULE_INSPECT, wxTRANSLATE("Quenta Inspect Studio"), "Quenta Inspect Studio.exe",
+     ID_BUTTON_INSPECT, wxTRANSLATE("Inspect"), wxTRANSLATE("&Inspect Profile..."),
+     ID_ABOUT_INSPECT},
+    {ID_MODULE_EDIT, wxTRANSLATE("Quenta Edit Studio"), "Quenta Edit Studio.exe", ID_BUTTON_EDIT,
+     wxTRANSLATE("Edit"), wxTRANSLATE("&Edit Profile..."), ID_ABOUT_EDIT},
 };
 
 } // namespace

@@ -1,5 +1,5 @@
-// The suite's six modules: ids, product names and executables, and the command
-// line that starts one of them.
+// The suite's six modules: ids, labels, product names and executables, and the
+// command line that starts one of them.
 #pragma once
 
 #include <wx/arrstr.h>
@@ -10,6 +10,10 @@ struct ModuleInfo
     int moduleId;
     const char* displayName; // product name; also the Verify window's title
     const char* executable;  // relative to the launcher's directory
+    int buttonId;            // the launcher view's button
+    const char* buttonLabel; // untranslated catalogue keys
+    const char* menuLabel;
+    int aboutId; // its entry in the About Modules submenu
 };
 
 // The catalogue entry of a module id, or null when the id names no module.

@@ -1,42 +1,48 @@
+#include "app/UserLanguage.h"
 #include "frame/Veltro3MainAppStandardView.h"
-
-#include <wx/intl.h>
 
 namespace {
 
-bool InFamily(const wxString& canonicalName, const char* family)
+// A row matches a whole language family by its code ("de" matches "de", "de_AT"),
+// or exact canonical names only.
+struct LanguageRow
 {
-    return canonicalName == family || canonicalName.StartsWith(wxString(family) + "_");
+    bool family;
+    const char* names[3];
+    int id;
+};
+
+const LanguageRow kLanguageRows[] = {
+    {false, {"en_GB"}, 0x0809},
+    {true, {"en"}, 0x0409},
+    {true, {"fr"}, 0x040C},
+    {false, {"it_IT", "it", "it_CH"}, 0x0410},
+    {true, {"de"}, 0x0407},
+    {true, {"es"}, 0x040A},
+    {false, {"nl_NL", "nl", "nl_BE"}, 0x0413},
+    {false, {"pt_BR"}, 0x0416},
+    {false, {"ja_JP", "ja"}, 0x0411},
+    {false, {"zh_CN"}, 0x0804},
+};
+
+bool Matches(const LanguageRow& row, const wxString& name)
+{
+    for (const char* candidate : row.names) {
+        if (!candidate)
+            break;
+        if (name == candidate || (row.family && name.StartsWith(wxString(candidate) + "_")))
+            return true;
+    }
+    return false;
 }
 
 } // namespace
 
 int GetModuleLanguageId()
 {
-    const wxLocale* locale = wxGetLocale();
-    const int language = locale ? locale->GetLanguage() : int(wxLANGUAGE_UNKNOWN);
-    const wxString name =
-        language > wxLANGUAGE_UNKNOWN ? wxLocale::GetLanguageCanonicalName(language) : wxString();
-
-    if (language == wxLANGUAGE_ENGLISH_UK)
-        return 0x0809;
-    if (InFamily(name, "en"))
-        return 0x0409;
-    if (InFamily(name, "fr"))
-        return 0x040C;
-    if (language == wxLANGUAGE_ITALIAN || language == wxLANGUAGE_ITALIAN_SWISS)
-        return 0x0410;
-    if (InFamily(name, "de"))
-        return 0x0407;
-    if (InFamily(name, "es"))
-        return 0x040A;
-    if (InFamily(name, "nl"))
-        return 0x0413;
-    if (language == wxLANGUAGE_PORTUGUESE_BRAZILIAN)
-        return 0x0416;
-    if (language == wxLANGUAGE_JAPANESE)
-        return 0x0411;
-    if (language == wxLANGUAGE_CHINESE_SIMPLIFIED)
-        return 0x0804;
+    const wxString name = GetUserLanguageName();
+    for (const LanguageRow& row : kLanguageRows)
+        if (Matches(row, name))
+            return row.id;
     return 0x0409;
 }

@@ -4,6 +4,7 @@
 #include "about/Splash.h"
 #include "app/Veltro3App.h"
 #include "frame/Ids.h"
+#include "frame/ModuleCatalog.h"
 #include "frame/Veltro3MainAppStandardView.h"
 #include "help/Documentation.h"
 #include "resources/IconBundle.h"
@@ -18,33 +19,29 @@ namespace {
 const wxString kLauncherPage = "Launcher.html";
 } // namespace
 
-wxBEGIN_EVENT_TABLE(Veltro3AppFrame, wxFrame) EVT_MENU(ID_MODULE_PRINTER,
-                                                       Veltro3AppFrame::OnLaunchPrinter)
+// clang-format off
+wxBEGIN_EVENT_TABLE(Veltro3AppFrame, wxFrame)
+    EVT_MENU(ID_MODULE_PRINTER, Veltro3AppFrame::OnLaunchPrinter)
     EVT_MENU(ID_MODULE_MONITOR, Veltro3AppFrame::OnLaunchMonitor)
-        EVT_MENU(ID_MODULE_DEVICELINK, Veltro3AppFrame::OnLaunchDeviceLink)
-            EVT_MENU(ID_MODULE_INSPECT,
-                     Veltro3AppFrame::OnLaunchInspect) EVT_MENU(ID_MODULE_EDIT,
-                                                                Veltro3AppFrame::OnLaunchEdit)
-                EVT_MENU(ID_MODULE_VERIFY,
-                         Veltro3AppFrame::OnLaunchVerify) EVT_MENU(ID_HELP, Veltro3AppFrame::OnHelp)
-                    EVT_MENU(ID_USER_GUIDE, Veltro3AppFrame::OnUserGuide)
-                        EVT_MENU(ID_USER_FORUM, Veltro3AppFrame::OnUserForum)
-                            EVT_MENU(ID_HELP_TOOL, Veltro3AppFrame::OnHelpTool)
-                                EVT_MENU(ID_CHECK_UPDATES, Veltro3AppFrame::OnCheckForUpdates)
-                                    EVT_MENU(ID_EXIT, Veltro3AppFrame::OnExitCommand)
-                                        EVT_MENU(ID_ABOUT, Veltro3AppFrame::OnAbout)
-                                            EVT_MENU_RANGE(ID_ABOUT_PRINTER, ID_ABOUT_VERIFY,
-                                                           Veltro3AppFrame::OnAboutModule)
-                                                EVT_MENU(ID_HOW_TO, Veltro3AppFrame::OnHowTo)
-                                                    EVT_CLOSE(Veltro3AppFrame::OnClose)
-                                                        EVT_BUTTON(ID_BUTTON_HELP,
-                                                                   Veltro3AppFrame::OnHelp)
-                                                            wxEND_EVENT_TABLE()
+    EVT_MENU(ID_MODULE_DEVICELINK, Veltro3AppFrame::OnLaunchDeviceLink)
+    EVT_MENU(ID_MODULE_INSPECT, Veltro3AppFrame::OnLaunchInspect)
+    EVT_MENU(ID_MODULE_EDIT, Veltro3AppFrame::OnLaunchEdit)
+    EVT_MENU(ID_MODULE_VERIFY, Veltro3AppFrame::OnLaunchVerify)
+    EVT_MENU(ID_HELP, Veltro3AppFrame::OnHelp)
+    EVT_MENU(ID_USER_GUIDE, Veltro3AppFrame::OnUserGuide)
+    EVT_MENU(ID_USER_FORUM, Veltro3AppFrame::OnUserForum)
+    EVT_MENU(ID_HELP_TOOL, Veltro3AppFrame::OnHelpTool)
+    EVT_MENU(ID_CHECK_UPDATES, Veltro3AppFrame::OnCheckForUpdates)
+    EVT_MENU(ID_EXIT, Veltro3AppFrame::OnExitCommand)
+    EVT_MENU(ID_ABOUT, Veltro3AppFrame::OnAbout)
+    EVT_MENU_RANGE(ID_ABOUT_PRINTER, ID_ABOUT_VERIFY, Veltro3AppFrame::OnAboutModule)
+    EVT_MENU(ID_HOW_TO, Veltro3AppFrame::OnHowTo)
+    EVT_CLOSE(Veltro3AppFrame::OnClose)
+    EVT_BUTTON(ID_BUTTON_HELP, Veltro3AppFrame::OnHelp)
+wxEND_EVENT_TABLE()
+// clang-format on
 
-                                                                Veltro3AppFrame::Veltro3AppFrame(
-                                                                    const wxString& title,
-                                                                    const wxPoint& pos,
-                                                                    const wxSize& size)
+Veltro3AppFrame::Veltro3AppFrame(const wxString& title, const wxPoint& pos, const wxSize& size)
     : m_sizer(nullptr), m_standardView(nullptr)
 {
     Create(nullptr, wxID_ANY, title, pos, size,
@@ -77,24 +74,21 @@ Veltro3AppFrame::~Veltro3AppFrame() = default;
 
 void Veltro3AppFrame::BuildMenuBar()
 {
+    // The File menu and the About Modules submenu list the modules in the
+    // same order, the File menu with a separator after the three creators.
+    const int order[] = {ID_MODULE_PRINTER, ID_MODULE_MONITOR, ID_MODULE_DEVICELINK,
+                         ID_MODULE_INSPECT, ID_MODULE_EDIT,    ID_MODULE_VERIFY};
     wxMenu* file = new wxMenu;
-    file->Append(ID_MODULE_PRINTER, _("Create &Printer Profile..."), wxString());
-    file->Append(ID_MODULE_MONITOR, _("Create &Monitor Profile..."), wxString());
-    file->Append(ID_MODULE_DEVICELINK, _("Create &Device Link Profile..."), wxString());
-    file->AppendSeparator();
-    file->Append(ID_MODULE_INSPECT, _("&Inspect Profile..."), wxString());
-    file->Append(ID_MODULE_EDIT, _("&Edit Profile..."), wxString());
-    file->Append(ID_MODULE_VERIFY, _("&Verify Color..."), wxString());
+    wxMenu* modules = new wxMenu;
+    for (int moduleId : order) {
+        const ModuleInfo* module = FindModule(moduleId);
+        if (moduleId == ID_MODULE_INSPECT)
+            file->AppendSeparator();
+        file->Append(moduleId, wxGetTranslation(module->menuLabel), wxString());
+        modules->Append(module->aboutId, wxGetTranslation(module->displayName), wxString());
+    }
     file->AppendSeparator();
     file->Append(ID_EXIT, _("E&xit"), wxString());
-
-    wxMenu* modules = new wxMenu;
-    modules->Append(ID_ABOUT_PRINTER, _("Quenta Print Studio"), wxString());
-    modules->Append(ID_ABOUT_MONITOR, _("Zel Display Studio"), wxString());
-    modules->Append(ID_ABOUT_DEVICELINK, _("Quenta Link Studio"), wxString());
-    modules->Append(ID_ABOUT_INSPECT, _("Quenta Inspect Studio"), wxString());
-    modules->Append(ID_ABOUT_EDIT, _("Quenta Edit Studio"), wxString());
-    modules->Append(ID_ABOUT_VERIFY, _("Zel Verify Studio"), wxString());
 
     wxMenu* help = new wxMenu;
     help->Append(ID_HELP, _("Veltrona &Help\tF1"), wxString());

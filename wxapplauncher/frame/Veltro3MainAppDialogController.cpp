@@ -1,26 +1,118 @@
 #include "frame/Veltro3MainAppDialogController.h"
 
+#include "controls/TextBitmap.h"
+
+#include <wx/dcclient.h>
+#include <wx/dcmemory.h>
+#include <wx/settings.h>
+#include <wx/xrc/xmlres.h>
+
 namespace {
 // The launcher picture is laid out for exactly this client size.
 const wxSize kViewSize(564, 344);
+const wxPoint kCreateTitle(250, 25);
+const wxPoint kEvaluateTitle(418, 25);
 } // namespace
 
-wxBEGIN_EVENT_TABLE(Veltro3MainAppDialogController, wxPanel) wxEND_EVENT_TABLE()
+// clang-format off
+wxBEGIN_EVENT_TABLE(Veltro3MainAppDialogController, wxPanel)
+    EVT_SYS_COLOUR_CHANGED(Veltro3MainAppDialogController::OnSysColourChanged)
+    EVT_PAINT(Veltro3MainAppDialogController::OnPaint)
+    EVT_ERASE_BACKGROUND(Veltro3MainAppDialogController::OnEraseBackground)
+wxEND_EVENT_TABLE()
+// clang-format on
 
-    Veltro3MainAppDialogController::Veltro3MainAppDialogController(wxWindow* parent, wxWindowID id,
-                                                                   const wxPoint& pos,
-                                                                   const wxSize& size, long style,
-                                                                   const wxString& name)
+bool IsUsablePicture(const wxBitmap& bitmap)
+{
+    return bitmap.IsOk() && bitmap.GetWidth() > 0 && bitmap.GetHeight() > 0;
+}
+
+wxColour DarkOnPicture(const wxColour& colour)
+{
+    const double luminance = 0.30 * colour.Red() + 0.59 * colour.Green() + 0.11 * colour.Blue();
+    return luminance < 127.5 ? colour : *wxBLACK;
+}
+
+Veltro3MainAppDialogController::Veltro3MainAppDialogController(wxWindow* parent, wxWindowID id,
+                                                               const wxPoint& pos,
+                                                               const wxSize& size, long style,
+                                                               const wxString& name)
     : wxPanel(parent, id, pos, size, style, name)
 {
+    ResetViewColour();
+    m_background = wxXmlResource::Get()->LoadBitmap("Veltro2AppFrame::LauncherBG");
     SetInitialSize(size);
 }
 
 Veltro3MainAppDialogController::~Veltro3MainAppDialogController() = default;
 
+void Veltro3MainAppDialogController::ResetViewColour()
+{
+    m_viewColour = wxColour(224, 223, 227, 255);
+}
+
 void Veltro3MainAppDialogController::UpdateModuleButtons() {}
+
+void Veltro3MainAppDialogController::DrawContent(wxDC&) {}
+
+void Veltro3MainAppDialogController::Refresh(bool eraseBackground, const wxRect* rect)
+{
+    m_dirty = true;
+    wxPanel::Refresh(eraseBackground, rect);
+}
 
 wxSize Veltro3MainAppDialogController::DoGetBestSize() const
 {
     return kViewSize;
+}
+
+void Veltro3MainAppDialogController::OnPaint(wxPaintEvent&)
+{
+    wxPaintDC dc(this);
+    const wxSize size = GetClientSize();
+    if (size.x <= 0 || size.y <= 0)
+        return;
+    if (!m_backBuffer.IsOk() || m_backBuffer.GetSize() != size) {
+        m_backBuffer = wxBitmap(size.x, size.y);
+        m_dirty = true;
+    }
+    if (!m_backBuffer.IsOk())
+        return;
+    if (m_dirty) {
+        wxMemoryDC memory(m_backBuffer);
+        DrawBackground(memory);
+        DrawContent(memory);
+        memory.SelectObject(wxNullBitmap);
+        m_dirty = false;
+    }
+    dc.DrawBitmap(m_backBuffer, 0, 0, false);
+}
+
+void Veltro3MainAppDialogController::DrawBackground(wxDC& dc)
+{
+    dc.SetBackground(wxBrush(GetBackgroundColour(), wxBRUSHSTYLE_SOLID));
+    dc.Clear();
+    if (IsUsablePicture(m_background))
+        dc.DrawBitmap(m_background, 0, 0, true);
+
+    dc.SetFont(GetUIFont(8, wxBOLD));
+    dc.SetTextForeground(DarkOnPicture(dc.GetTextForeground()));
+    dc.DrawText(_("Create Profile"), kCreateTitle);
+    dc.DrawText(_("Evaluate Profile"), kEvaluateTitle);
+
+    // A sunken rule under the menu bar.
+    const int width = GetClientSize().x;
+    dc.SetPen(wxPen(wxSystemSettings::GetColour(wxSYS_COLOUR_BTNSHADOW), 1, wxPENSTYLE_SOLID));
+    dc.DrawLine(0, 0, width, 0);
+    dc.SetPen(wxPen(wxSystemSettings::GetColour(wxSYS_COLOUR_BTNHIGHLIGHT), 1, wxPENSTYLE_SOLID));
+    dc.DrawLine(0, 1, width, 1);
+}
+
+void Veltro3MainAppDialogController::OnEraseBackground(wxEraseEvent&) {}
+
+void Veltro3MainAppDialogController::OnSysColourChanged(wxSysColourChangedEvent& event)
+{
+    ResetViewColour();
+    Refresh(true);
+    event.Skip();
 }

@@ -39,6 +39,14 @@ IconImage DecodeIconImage(const unsigned char* data, std::size_t size)
     if (!data)
         return image;
     if (size >= 8 && std::memcmp(data, pngSignature, 8) == 0) {
+        // The first chunk is the header with the size, big-endian, as the PNG format has it.
+        if (size < 24 || std::memcmp(data + 12, "IHDR", 4) != 0)
+            return image;
+        const std::uint32_t width = Be32(data + 16), height = Be32(data + 20);
+        if (width == 0 || width > maxIconSide || height == 0 || height > maxIconSide)
+            return image;
+        image.width = int(width);
+        image.height = int(height);
         image.kind = IconImage::Kind::Png;
         image.png = data;
         image.pngSize = size;

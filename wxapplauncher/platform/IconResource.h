@@ -31,7 +31,7 @@ struct IconImage
         Png
     };
     Kind kind = Kind::Invalid;
-    int width = 0;
+    int width = 0; // Png: as its header declares
     int height = 0;
     std::vector<unsigned char> rgba;    // Pixels: width * height * 4, top row first
     const unsigned char* png = nullptr; // Png: the stored bytes
@@ -39,5 +39,6 @@ struct IconImage
 };
 
 // Decodes an icon image resource: a device-independent bitmap (1, 4, 8, 24 or 32 bits,
-// uncompressed, twice the height for colour and mask) or a PNG file.
+// uncompressed, twice the height for colour and mask) or a PNG file; either is refused
+// when it is larger than 1024 pixels a side.
 IconImage DecodeIconImage(const unsigned char* data, std::size_t size);

@@ -1,29 +1,51 @@
 #include "platform/InstanceLock.h"
 
-#include <wx/filefn.h>
-#include <wx/utils.h>
+#include "platform/PrivateRuntimeDir.h"
 
+#include <cerrno>
 #include <fcntl.h>
+#include <sys/file.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
-void RemoveStaleInstanceLock(const wxString& dir, const wxString& name)
+InstanceLock::~InstanceLock()
 {
-    wxString folder = dir.empty() ? wxGetHomeDir() : dir;
+    if (m_fd >= 0)
+        close(m_fd);
+}
+
+bool InstanceLock::Create(const wxString& name, const wxString& dir)
+{
+    if (m_fd >= 0)
+        close(m_fd);
+    m_fd = -1;
+    m_anotherRunning = false;
+
+    wxString folder = dir.empty() ? GetPrivateRuntimeDir() : dir;
+    if (folder.empty() || name.empty() || name.Contains("/"))
+        return false;
     if (!folder.EndsWith("/"))
         folder += "/";
-    const wxString path = folder + name;
 
-    const int fd = open(path.fn_str(), O_RDONLY | O_NOFOLLOW | O_CLOEXEC);
+    // Close-on-exec: started modules must not keep the lock after the launcher ends.
+    const int fd = open((folder + name).fn_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600);
     if (fd < 0)
-        return;
+        return false;
+    struct stat info;
+    if (fstat(fd, &info) != 0 || !S_ISREG(info.st_mode) || info.st_uid != getuid()) {
+        close(fd);
+        return false;
+    }
 
-    // The holder keeps a write lock on the file for as long as it runs; the
-    // kernel drops it when the holder dies, however it ends.
-    struct flock probe = {};
-    probe.l_type = F_WRLCK;
-    probe.l_whence = SEEK_SET;
-    const bool free = fcntl(fd, F_GETLK, &probe) == 0 && probe.l_type == F_UNLCK;
-    close(fd);
-    if (free)
-        wxRemoveFile(path);
+    int result;
+    do
+        result = flock(fd, LOCK_EX | LOCK_NB);
+    while (result != 0 && errno == EINTR);
+    if (result != 0) {
+        m_anotherRunning = errno == EWOULDBLOCK;
+        close(fd);
+        return m_anotherRunning;
+    }
+    m_fd = fd;
+    return true;
 }

@@ -1,10 +1,27 @@
-// Keeps a dead copy's instance lock from stopping new copies.
+// The per-user instance lock: one copy of the launcher per user, and a copy that
+// died, however it ended, never keeps the next one from starting.
 #pragma once
 
 #include <wx/string.h>
 
-// Removes the lock file `name` in `dir` (the home directory when `dir` is empty)
-// when no running process holds its lock. The toolkit's checker trusts the
-// process id written in the file, which a killed copy leaves behind and which
-// the system may hand to an unrelated process later.
-void RemoveStaleInstanceLock(const wxString& dir, const wxString& name);
+// Used like the toolkit's single-instance checker: Create, then IsAnotherRunning.
+// The lock is an flock on a file in the private runtime directory; the kernel
+// drops it with its holder. The file is never deleted, so two copies always
+// contend for the same file.
+class InstanceLock
+{
+public:
+    InstanceLock() = default;
+    ~InstanceLock();
+    InstanceLock(const InstanceLock&) = delete;
+    InstanceLock& operator=(const InstanceLock&) = delete;
+
+    // Takes the lock `name` in `dir` (the private runtime directory when empty).
+    // False when there is no usable directory or file; then no copy is seen.
+    bool Create(const wxString& name, const wxString& dir = wxString());
+    bool IsAnotherRunning() const { return m_anotherRunning; }
+
+private:
+    int m_fd = -1;
+    bool m_anotherRunning = false;
+};

@@ -8,33 +8,6 @@
 
 namespace {
 
-class FileByteSource : public ByteSource
-{
-public:
-    explicit FileByteSource(const std::string& path) : m_file(path, std::ios::binary)
-    {
-        if (m_file) {
-            m_file.seekg(0, std::ios::end);
-            const std::streamoff end = m_file.tellg();
-            m_size = end > 0 ? std::uint64_t(end) : 0;
-        }
-    }
-    std::uint64_t Size() const override { return m_size; }
-    bool Read(std::uint64_t offset, void* out, std::size_t count) const override
-    {
-        if (offset > m_size || count > m_size - offset)
-            return false;
-        m_file.clear();
-        m_file.seekg(std::streamoff(offset));
-        m_file.read(static_cast<char*>(out), std::streamsize(count));
-        return m_file.gcount() == std::streamsize(count);
-    }
-
-private:
-    mutable std::ifstream m_file;
-    std::uint64_t m_size = 0;
-};
-
 // Appends one code point as UTF-8.
 void AppendUtf8(std::string& out, std::uint32_t cp)
 {
@@ -107,6 +80,25 @@ bool SameNameIgnoringAsciiCase(const std::string& a, const std::string& b)
 }
 
 } // namespace
+
+FileByteSource::FileByteSource(const std::string& path) : m_file(path, std::ios::binary)
+{
+    if (m_file) {
+        m_file.seekg(0, std::ios::end);
+        const std::streamoff end = m_file.tellg();
+        m_size = end > 0 ? std::uint64_t(end) : 0;
+    }
+}
+
+bool FileByteSource::Read(std::uint64_t offset, void* out, std::size_t count) const
+{
+    if (offset > m_size || count > m_size - offset)
+        return false;
+    m_file.clear();
+    m_file.seekg(std::streamoff(offset));
+    m_file.read(static_cast<char*>(out), std::streamsize(count));
+    return m_file.gcount() == std::streamsize(count);
+}
 
 bool MemoryByteSource::Read(std::uint64_t offset, void* out, std::size_t count) const
 {

@@ -5,6 +5,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <fstream>
 #include <string>
 #include <vector>
 
@@ -53,6 +54,19 @@ public:
 private:
     const unsigned char* m_data;
     std::size_t m_size;
+};
+
+// A file read in place; a file that cannot be opened has size 0.
+class FileByteSource : public ByteSource
+{
+public:
+    explicit FileByteSource(const std::string& path);
+    std::uint64_t Size() const override { return m_size; }
+    bool Read(std::uint64_t offset, void* out, std::size_t count) const override;
+
+private:
+    mutable std::ifstream m_file;
+    std::uint64_t m_size = 0;
 };
 
 // The contents of the named section of an ELF file (32 or 64 bit, little-endian);

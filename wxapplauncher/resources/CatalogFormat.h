@@ -1,5 +1,6 @@
 // Checks that bytes form a GNU gettext message catalogue (.mo) whose every table and
-// string lies inside them, so that a damaged catalogue is skipped before the toolkit reads it.
+// string lies inside them and that the toolkit's own reader can take, so that a damaged
+// or hostile catalogue is skipped before the toolkit reads it.
 #pragma once
 
 #include <cstddef>

@@ -1,5 +1,6 @@
 #include "resources/Catalogs.h"
 
+#include "app/UserLanguage.h"
 #include "platform/ResourceImage.h"
 #include "resources/CatalogFormat.h"
 #include "resources/MemoryTranslationsLoader.h"
@@ -7,7 +8,6 @@
 #include <wx/filesys.h>
 #include <wx/fs_mem.h>
 #include <wx/translation.h>
-#include <wx/utils.h>
 
 #include <memory>
 
@@ -53,35 +53,18 @@ bool LoadCatalogResource(const ResourceImage& image, const wxString& resourceNam
     return true;
 }
 
-namespace {
-
-// The user's language as the environment names it ("de_AT" from "de_AT.UTF-8"), for a
-// locale that the system does not have; empty for none or the C locale.
-wxString LanguageOfEnvironment()
+void InitLocale(wxLocale& locale)
 {
-    for (const char* variable : {"LC_ALL", "LC_MESSAGES", "LANG"}) {
-        wxString value;
-        if (!wxGetEnv(variable, &value) || value.empty())
-            continue;
-        value = value.BeforeFirst('.').BeforeFirst('@');
-        return value == "C" || value == "POSIX" ? wxString() : value;
-    }
-    return wxString();
-}
+    // Only an installed locale can be set for the C library; the catalogues
+    // follow the decided language either way.
+    if (IsUserLocaleInstalled())
+        locale.Init(GetUserLanguage(), wxLOCALE_LOAD_DEFAULT);
 
-} // namespace
-
-void PrepareTranslations(wxLocale& locale, wxLanguage language)
-{
     wxTranslations* translations = wxTranslations::Get();
     if (!translations || !locale.IsOk()) {
-        // The system locale is not installed: without translations of our own the
-        // catalogues would never be asked for.
         translations = new wxTranslations;
-        if (language != wxLANGUAGE_UNKNOWN && language != wxLANGUAGE_DEFAULT)
-            translations->SetLanguage(language);
-        else if (!LanguageOfEnvironment().empty())
-            translations->SetLanguage(LanguageOfEnvironment());
+        const wxString name = GetUserLanguageName();
+        translations->SetLanguage(name.empty() ? wxString("en") : name);
         wxTranslations::Set(translations);
     }
     translations->SetLoader(new MemoryTranslationsLoader);

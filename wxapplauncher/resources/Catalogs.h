@@ -18,6 +18,7 @@ wxString CatalogMemoryName(const wxString& resourceName);
 // Always true, so that an enumeration goes on over all resources.
 bool LoadCatalogResource(const ResourceImage& image, const wxString& resourceName);
 
-// Lets the locale find catalogues in the memory file system, also when the
-// system locale itself is not installed.
-void PrepareTranslations(wxLocale& locale, wxLanguage language);
+// Sets up the locale and the translations for the user's decided language
+// (DecideUserLanguage), so that catalogues are found in the memory file system
+// also when the system locale itself is not installed.
+void InitLocale(wxLocale& locale);

@@ -11,12 +11,9 @@
 
 #include <cstring>
 
-namespace {
-
-// The icon of one image resource, or an invalid icon.
-wxIcon CreateIconFromResource(const ResourceEntry& resource)
+wxImage DecodeIconResourceImage(const unsigned char* data, std::size_t size)
 {
-    const IconImage decoded = DecodeIconImage(resource.data, resource.size);
+    const IconImage decoded = DecodeIconImage(data, size);
     wxImage image;
     if (decoded.kind == IconImage::Kind::Png) {
         if (!wxImage::FindHandler(wxBITMAP_TYPE_PNG))
@@ -35,6 +32,15 @@ wxIcon CreateIconFromResource(const ResourceEntry& resource)
             alpha[i] = decoded.rgba[i * 4 + 3];
         }
     }
+    return image;
+}
+
+namespace {
+
+// The icon of one image resource, or an invalid icon.
+wxIcon CreateIconFromResource(const ResourceEntry& resource)
+{
+    const wxImage image = DecodeIconResourceImage(resource.data, resource.size);
     wxIcon icon;
     if (image.IsOk())
         icon.CopyFromBitmap(wxBitmap(image));

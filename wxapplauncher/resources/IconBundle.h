@@ -2,6 +2,7 @@
 #pragma once
 
 #include <wx/iconbndl.h>
+#include <wx/image.h>
 #include <wx/string.h>
 
 class ResourceImage;
@@ -10,3 +11,6 @@ class ResourceImage;
 // missing or cannot be decoded are skipped.
 wxIconBundle LoadIconBundle(const wxString& name, int depth);
 wxIconBundle LoadIconBundle(const ResourceImage& image, const wxString& name, int depth);
+
+// One icon image resource decoded to an image with alpha; invalid when it cannot be.
+wxImage DecodeIconResourceImage(const unsigned char* data, std::size_t size);

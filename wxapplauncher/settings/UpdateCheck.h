@@ -1,6 +1,11 @@
-// The suite's updater: leftover temporary files, the scheduled and the manual check.
+// The suite's updater: its leftover temporary files, the scheduled start at
+// launch and the start from Help > "Check for Updates...".
 #pragma once
 
+// Removes the updater's temporary files ("ZELUPDATE_*") from the user's
+// temporary directory: only regular files of the user's own.
 void RemoveUpdaterTempFiles();
+// Starts the updater when the date in "Next Launch" has come.
 void CheckForUpdateAtLaunch();
+// Starts the updater at once, marked as started by the user.
 void CheckForUpdatesNow();

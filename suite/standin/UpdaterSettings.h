@@ -1,0 +1,14 @@
+// What the updater stand-in reads from the settings it shares with the
+// launcher: the value of "Silent", as the real updater would find it.
+#pragma once
+
+#include <optional>
+#include <string>
+
+namespace standin {
+
+// "Silent" from the user's settings file, else from the system-wide one; the
+// files are found as the launcher finds them. Empty when neither has it.
+std::optional<std::string> FindSilentSetting();
+
+} // namespace standin

@@ -1,0 +1,188 @@
+// The user guide and the web pages, opened through a test desktop of its own:
+// XDG folders in which a stand-in PDF reader is registered (or not), and an
+// opener on PATH that is the real xdg-open, a stand-in, or one that fails.
+#include "controls/ZelLinkText.h"
+#include "help/CAcrobatNotFoundDialog.h"
+#include "help/Documentation.h"
+#include "support/DialogRecorder.h"
+#include "support/GuiWait.h"
+#include "support/ScopedEnv.h"
+#include "support/StandinDir.h"
+#include "support/StandinLog.h"
+
+#include <gdk/gdk.h>
+#include <gtest/gtest.h>
+#include <wx/app.h>
+#include <wx/timer.h>
+#include <wx/uiaction.h>
+
+#include <filesystem>
+#include <fstream>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+const std::string kXdgOpen = "/usr/bin/xdg-open";
+
+class TestDesktop
+{
+public:
+    // The real opener needs the system's tools; the others must not find it.
+    explicit TestDesktop(const std::string& opener = kXdgOpen)
+        : m_dir({"pdfreader", "bin/xdg-open"}),
+          m_env({{"XDG_DATA_HOME", Root() + "/data"},
+                 {"XDG_DATA_DIRS", Root() + "/share"},
+                 {"XDG_CONFIG_HOME", Root() + "/config"},
+                 {"XDG_CONFIG_DIRS", Root() + "/share"},
+                 {"XDG_CURRENT_DESKTOP", ""},
+                 {"DESKTOP_SESSION", ""},
+                 {"PATH", Root() + "/bin" + (opener == kXdgOpen ? ":/usr/bin:/bin" : "")},
+                 {"VELTRONA_STANDIN_LOG", Log()},
+                 {"VELTRONA_STANDIN_EXIT", "1"}})
+    {
+        SetOpener(opener);
+        fs::create_directories(Root() + "/data/applications");
+        // The system's MIME database and icons, without the system's programs.
+        fs::create_directories(Root() + "/share");
+        fs::create_symlink("/usr/share/mime", Root() + "/share/mime");
+        fs::create_symlink("/usr/share/icons", Root() + "/share/icons");
+    }
+
+    const std::string& Root() const { return m_dir.Path(); }
+    void SetOpener(const std::string& opener) const
+    {
+        fs::remove(Root() + "/bin/xdg-open");
+        fs::create_symlink(opener, Root() + "/bin/xdg-open");
+    }
+    std::string Log() const { return Root() + "/starts.log"; }
+
+    void InstallReader() const
+    {
+        std::ofstream(Root() + "/data/applications/pdfreader.desktop")
+            << "[Desktop Entry]\nType=Application\nName=Reader\nExec=" << Root()
+            << "/pdfreader %f\nMimeType=application/pdf;\n";
+        std::ofstream(Root() + "/data/applications/mimeapps.list")
+            << "[Default Applications]\napplication/pdf=pdfreader.desktop\n";
+    }
+
+private:
+    StandinDir m_dir;
+    ScopedEnv m_env;
+};
+
+TEST(UserGuideTest, GuideOfTheLanguageFolderOpensInTheReader)
+{
+    TestDesktop desktop;
+    desktop.InstallReader();
+    const std::string install = desktop.Root() + "/it's \"my\" install/";
+    const std::string guides = install + "Help/Documentation/";
+    for (const char* folder : {"en", "de", "zh_CN", "fr"})
+        fs::create_directories(guides + folder);
+    for (const char* folder : {"en", "de", "zh_CN"})
+        std::ofstream(guides + folder + "/Veltrona.pdf") << "%PDF-1.4\n";
+
+    const struct
+    {
+        const char *language, *folder;
+    } cases[] = {{"de_DE", "de"}, {"it_IT", "en"}, {"", "en"}, {"zh_CN", "zh_CN"}, {"fr_FR", "fr"}};
+    for (const auto& test : cases) {
+        SCOPED_TRACE(test.language);
+        fs::remove(desktop.Log());
+        DialogRecorder dialogs;
+        OpenUserGuide(install, test.language);
+        const auto records = SettledRecords(desktop.Log());
+        const std::string path = guides + test.folder + "/Veltrona.pdf";
+        if (fs::exists(path)) {
+            ASSERT_EQ(records.size(), 1u);
+            EXPECT_EQ(records[0].args, std::vector<std::string>{path});
+            EXPECT_TRUE(dialogs.Dialogs().empty());
+        } else {
+            EXPECT_TRUE(records.empty());
+            ASSERT_EQ(dialogs.Dialogs().size(), 1u);
+            EXPECT_EQ(dialogs.Dialogs()[0].message, "\"" + path + "\" not found.");
+            EXPECT_EQ(dialogs.Dialogs()[0].caption, "Message");
+        }
+    }
+}
+
+TEST(UserGuideTest, WithoutAReaderTheDialogAsksAgainOnlyAfterOK)
+{
+    const struct
+    {
+        int answer;
+        bool installMeanwhile, asksAgain;
+    } cases[] = {{wxID_OK, true, true}, {wxID_CANCEL, true, false}, {wxID_OK, false, false}};
+    for (const auto& test : cases) {
+        SCOPED_TRACE(test.answer);
+        TestDesktop desktop;
+        DialogRecorder dialogs([&](wxDialog*) {
+            if (test.installMeanwhile)
+                desktop.InstallReader();
+            return test.answer;
+        });
+        OpenUserGuide();
+        // This program's folder has no guide: a second question that finds
+        // the reader ends in the "not found." message.
+        ASSERT_EQ(dialogs.Dialogs().size(), test.asksAgain ? 2u : 1u);
+        EXPECT_EQ(dialogs.Dialogs()[0].caption, "Acrobat Reader not found");
+    }
+
+    // Escape, the one way out besides OK, counts as not OK.
+    CAcrobatNotFoundDialog dialog(nullptr);
+    wxTimer giveUp;
+    giveUp.Bind(wxEVT_TIMER, [&](wxTimerEvent&) { dialog.EndModal(wxID_ABORT); });
+    giveUp.StartOnce(10000);
+    wxTheApp->CallAfter([&] {
+        WaitFor([&] { return dialog.IsActive(); }, 5000);
+        wxUIActionSimulator().Char(WXK_ESCAPE);
+    });
+    EXPECT_EQ(dialog.ShowModal(), wxID_CANCEL);
+}
+
+TEST(UserGuideTest, ReaderLinkLightsUpAndOpensItsAddressOrSaysWhyNot)
+{
+    TestDesktop desktop(VELTRONA_STANDIN_PATH);
+    DialogRecorder dialogs;
+    wxUIActionSimulator pointer;
+    pointer.MouseMove(0, 0);
+    CAcrobatNotFoundDialog dialog(nullptr);
+    dialog.Show();
+    ZelLinkText* link = dialog.m_link;
+    // Placed by the window manager and ready for the pointer once active.
+    ASSERT_TRUE(WaitFor([&] { return dialog.IsActive(); }));
+    EXPECT_TRUE(link->GetFont().GetUnderlined());
+    const wxCursor before(wxCURSOR_CROSS);
+    link->SetCursor(before);
+    const auto isRed = [&] { return link->GetForegroundColour() == *wxRED; };
+    const wxPoint inside = link->GetScreenRect().GetLeftTop() + wxPoint(4, 4);
+
+    // The pointer leaves, or the window is deactivated while it is over the link.
+    for (bool byDeactivation : {false, true}) {
+        pointer.MouseMove(inside);
+        ASSERT_TRUE(WaitFor(isRed));
+        EXPECT_EQ(gdk_cursor_get_cursor_type(link->GetCursor().GetCursor()), GDK_HAND2);
+        wxActivateEvent deactivate(wxEVT_ACTIVATE, false);
+        if (byDeactivation)
+            dialog.HandleWindowEvent(deactivate);
+        else
+            pointer.MouseMove(link->GetScreenRect().GetBottomRight() + wxPoint(40, 40));
+        EXPECT_TRUE(WaitFor([&] { return !isRed(); }));
+        EXPECT_EQ(link->GetForegroundColour(), *wxBLUE);
+        EXPECT_TRUE(link->GetCursor().IsSameAs(before));
+    }
+
+    pointer.MouseClick();
+    const auto records = WaitForRecords(desktop.Log(), 1);
+    ASSERT_EQ(records.size(), 1u);
+    EXPECT_EQ(records[0].args, std::vector<std::string>{kReaderDownloadPage.ToStdString()});
+
+    desktop.SetOpener("/bin/false");
+    pointer.MouseClick();
+    ASSERT_TRUE(WaitFor([&] { return !dialogs.Dialogs().empty(); }));
+    EXPECT_EQ(dialogs.Dialogs()[0].message, "Failed to open the URL");
+    EXPECT_EQ(dialogs.Dialogs()[0].caption, "Error");
+    EXPECT_EQ(dialogs.Dialogs()[0].style & (wxOK | wxICON_ERROR), wxOK | wxICON_ERROR);
+}
+
+} // namespace

@@ -1,0 +1,132 @@
+// The updater's schedule and its "Silent" mark, the start from the Help menu,
+// and the clean-up of its temporary files at start-up. The updater stand-in
+// records the "Silent" it finds when it starts.
+#include "settings/UpdateCheck.h"
+#include "support/ProbeRun.h"
+#include "support/ScopedEnv.h"
+#include "support/StandinDir.h"
+#include "support/StandinLog.h"
+
+#include <gtest/gtest.h>
+#include <wx/datetime.h>
+#include <wx/filefn.h>
+
+#include <filesystem>
+#include <fstream>
+#include <sys/stat.h>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+const std::string kUpdater = "Quenta Updater.exe";
+const std::string kSettings = "/Zelgrave/Zel Updater.conf";
+
+std::string NextLaunch(int days, const std::string& after = "")
+{
+    const wxDateTime day = wxDateTime::Today() + wxDateSpan::Days(days);
+    return "Next\\ Launch=" + std::string(day.FormatISODate().utf8_str()) + after + "\n";
+}
+
+void Write(const std::string& path, const std::string& text)
+{
+    fs::create_directories(fs::path(path).parent_path());
+    std::ofstream(path, std::ios::binary) << text;
+}
+
+std::string Read(const std::string& path)
+{
+    std::ifstream in(path, std::ios::binary);
+    return in ? std::string(std::istreambuf_iterator<char>(in), {}) : "";
+}
+
+TEST(UpdaterTest, ScheduleAndSilentMark)
+{
+    using Value = std::optional<std::string>;
+    const std::string kept = "Silent=0\n# kept\n[Other]\nkey=value\n";
+    // Files given as "" are not there; userAfter "" means unchanged.
+    const struct
+    {
+        std::string user, system;
+        bool starts;
+        Value atLaunch, fromMenu;
+        std::string userAfter;
+    } cases[] = {
+        {"", "", true, {}, {}, ""},
+        {"Next\\ Launch=Never\n", "", false, {}, {}, ""},
+        {"Next\\ Launch=never\n", "", true, {}, {}, ""},
+        {NextLaunch(0), "", true, {}, {}, ""},
+        {NextLaunch(1), "", false, {}, {}, ""},
+        {NextLaunch(1, "x"), "", true, {}, {}, ""},
+        {"", NextLaunch(1), false, {}, {}, ""},
+        {kept, "", true, "1", "0", kept},
+        {"", "Silent=0\n", true, "1", "0", "Silent=0\n"},
+        {"Silent=abc\n", "", true, "abc", "abc", ""},
+        {"Silent=0\nName=\xe9t\xe9\n", "", true, "0", "0", ""}, // not UTF-8: left alone
+    };
+    for (const auto& test : cases) {
+        SCOPED_TRACE(test.user + "|" + test.system);
+        StandinDir install({kUpdater});
+        const std::string root = install.Path(), log = root + "/starts.log";
+        ScopedEnv env({{"XDG_CONFIG_HOME", root + "/config"},
+                       {"XDG_CONFIG_DIRS", root + "/etc"},
+                       {"VELTRONA_STANDIN_LOG", log},
+                       {"VELTRONA_STANDIN_EXIT", "1"}});
+        if (!test.user.empty())
+            Write(root + "/config" + kSettings, test.user);
+        if (!test.system.empty())
+            Write(root + "/etc" + kSettings, test.system);
+        const wxString oldDir = wxGetCwd();
+        wxSetWorkingDirectory(root);
+        CheckForUpdateAtLaunch();
+        const auto atLaunch = SettledRecords(log);
+        CheckForUpdatesNow();
+        const auto all = SettledRecords(log);
+        wxSetWorkingDirectory(oldDir);
+
+        ASSERT_EQ(atLaunch.size(), test.starts ? 1u : 0u);
+        ASSERT_EQ(all.size(), atLaunch.size() + 1);
+        EXPECT_EQ(all[0].exe, root + "/" + kUpdater);
+        if (test.starts) {
+            EXPECT_EQ(atLaunch[0].silent, test.atLaunch);
+        }
+        EXPECT_EQ(all.back().silent, test.fromMenu);
+        EXPECT_EQ(Read(root + "/config" + kSettings),
+                  test.userAfter.empty() ? test.user : test.userAfter);
+        struct stat info;
+        if (test.user.empty() && !test.userAfter.empty()) {
+            ASSERT_EQ(stat((root + "/config/Zelgrave").c_str(), &info), 0);
+            EXPECT_EQ(info.st_mode & 0777, 0700u);
+        }
+    }
+}
+
+TEST(UpdaterTest, StartUpRemovesLeftoversAndStartsADueUpdate)
+{
+    StandinDir install({kUpdater}), runtime({});
+    chmod(runtime.Path().c_str(), 0700);
+    const std::string root = install.Path(), tmp = root + "/tmp", log = root + "/starts.log";
+    fs::create_directories(tmp + "/ZELUPDATE_dir");
+    for (const char* name : {"/ZELUPDATE_abc", "/other.txt", "/xZELUPDATE_abc"})
+        Write(tmp + name, "x");
+    Write(root + "/target", "x");
+    fs::create_symlink(root + "/target", tmp + "/ZELUPDATE_link");
+    Write(root + "/config" + kSettings, "Silent=0\n");
+
+    ProbeRun launcher(root, {},
+                      {{"XDG_RUNTIME_DIR", runtime.Path()},
+                       {"XDG_CONFIG_HOME", root + "/config"},
+                       {"TMPDIR", tmp},
+                       {"VELTRONA_STANDIN_LOG", log},
+                       {"VELTRONA_STANDIN_EXIT", "1"}});
+    ASSERT_TRUE(launcher.WaitForShown());
+    const auto records = WaitForRecords(log, 1);
+    ASSERT_EQ(records.size(), 1u);
+    EXPECT_EQ(records[0].silent, "1");
+    EXPECT_FALSE(fs::exists(tmp + "/ZELUPDATE_abc"));
+    EXPECT_TRUE(fs::is_directory(tmp + "/ZELUPDATE_dir"));
+    EXPECT_TRUE(fs::is_symlink(tmp + "/ZELUPDATE_link") && fs::exists(root + "/target"));
+    EXPECT_TRUE(fs::exists(tmp + "/other.txt") && fs::exists(tmp + "/xZELUPDATE_abc"));
+}
+
+} // namespace

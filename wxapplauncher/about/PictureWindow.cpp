@@ -1,0 +1,19 @@
+#include "about/PictureWindow.h"
+
+#include <wx/display.h>
+#include <wx/region.h>
+
+void CentreOnPrimaryDisplay(wxTopLevelWindow* window, const wxSize& size)
+{
+    const wxRect screen = wxDisplay().GetGeometry();
+    window->Move(screen.x + (screen.width - size.x) / 2, screen.y + (screen.height - size.y) / 2);
+}
+
+void ShapeToPicture(wxTopLevelWindow* window, const wxBitmap& picture)
+{
+    if (!picture.IsOk())
+        return;
+    wxRegion shape;
+    shape.Union(picture);
+    window->SetShape(shape);
+}

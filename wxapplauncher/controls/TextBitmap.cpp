@@ -1,0 +1,234 @@
+#include "controls/TextBitmap.h"
+
+#include <wx/dcmemory.h>
+#include <wx/image.h>
+
+#include <algorithm>
+
+namespace {
+
+// Luminance weights, single precision as the artwork's tools use them.
+const double kRed = 0.30f;
+const double kGreen = 0.59f;
+const double kBlue = 0.11f;
+const int kSmallestFittedSize = 7;
+const int kWidthReserve = 2;
+
+struct Measured
+{
+    int widest = 0;
+    int totalHeight = 0;
+};
+
+// An empty line keeps the height of a line but has no width.
+wxSize LineExtent(wxDC& dc, const wxString& line)
+{
+    if (line.empty())
+        return wxSize(0, dc.GetTextExtent("i").GetHeight());
+    return dc.GetTextExtent(line);
+}
+
+Measured Measure(wxDC& dc, const wxArrayString& lines, int lineSpacing)
+{
+    Measured m;
+    for (const wxString& line : lines) {
+        const wxSize extent = LineExtent(dc, line);
+        m.widest = std::max(m.widest, extent.GetWidth());
+        m.totalHeight += extent.GetHeight() + lineSpacing;
+    }
+    return m;
+}
+
+int AnchorX(int x, int width, int alignment)
+{
+    if (x != -1)
+        return x;
+    if (alignment & wxALIGN_CENTER_HORIZONTAL)
+        return width / 2;
+    if (alignment & wxALIGN_RIGHT)
+        return width;
+    return 0;
+}
+
+// The room a line has beside its anchor: a label that starts right of an
+// icon must fit between its anchor and the right edge.
+int RoomForLines(int anchorX, int width, int alignment)
+{
+    if (alignment & wxALIGN_CENTER_HORIZONTAL)
+        return 2 * std::min(anchorX, width - anchorX);
+    if (alignment & wxALIGN_RIGHT)
+        return anchorX;
+    return width - anchorX;
+}
+
+} // namespace
+
+wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
+                               const wxArrayString& lines, const wxColour& colour, int alignment,
+                               int lineSpacing)
+{
+    const double luminance = kGreen * colour.Green() + kRed * colour.Red() + kBlue * colour.Blue();
+    const bool light = luminance >= 127.5;
+    const wxColour textColour = light ? *wxWHITE : *wxBLACK;
+    const wxColour backColour = light ? *wxBLACK : *wxWHITE;
+
+    wxFont fitted(font);
+    Measured m;
+    {
+        wxBitmap scratch(1, 1);
+        wxMemoryDC dc(scratch);
+        int points = fitted.GetPointSize();
+        const int room = size.GetWidth() == -1
+                             ? 0
+                             : RoomForLines(AnchorX(position.x, size.GetWidth(), alignment),
+                                            size.GetWidth(), alignment);
+        for (;;) {
+            fitted.SetPointSize(points);
+            dc.SetFont(fitted);
+            m = Measure(dc, lines, lineSpacing);
+            if (size.GetWidth() == -1 || m.widest <= room - kWidthReserve ||
+                points - 1 < kSmallestFittedSize)
+                break;
+            --points;
+        }
+    }
+
+    const int width = size.GetWidth() == -1 ? m.widest : size.GetWidth();
+    const int height = size.GetHeight() == -1 ? m.totalHeight : size.GetHeight();
+    if (width <= 0 || height <= 0)
+        return wxBitmap();
+    wxBitmap bitmap(width, height);
+    if (!bitmap.IsOk())
+        return bitmap;
+
+    {
+        wxMemoryDC dc(bitmap);
+        dc.SetBackground(wxBrush(backColour, wxBRUSHSTYLE_SOLID));
+        dc.Clear();
+        if (!lines.empty()) {
+            dc.SetBackgroundMode(wxBRUSHSTYLE_TRANSPARENT);
+            dc.SetTextForeground(textColour);
+            dc.SetFont(fitted);
+            const int x = AnchorX(position.x, width, alignment);
+            int y = position.y;
+            if (y == -1)
+                y = (alignment & wxALIGN_CENTER_VERTICAL) ? height / 2
+                    : (alignment & wxALIGN_BOTTOM)        ? height
+                                                          : 0;
+            if (alignment & wxALIGN_CENTER_VERTICAL)
+                y -= m.totalHeight / 2;
+            else if (alignment & wxALIGN_BOTTOM)
+                y -= m.totalHeight;
+            for (const wxString& line : lines) {
+                const wxSize extent = LineExtent(dc, line);
+                int lineX = x;
+                if (alignment & wxALIGN_CENTER_HORIZONTAL)
+                    lineX -= extent.GetWidth() / 2;
+                else if (alignment & wxALIGN_RIGHT)
+                    lineX -= extent.GetWidth();
+                dc.DrawText(line, lineX, y);
+                y += extent.GetHeight() + lineSpacing;
+            }
+        }
+    }
+
+    wxImage image = bitmap.ConvertToImage();
+    if (!image.IsOk())
+        return wxBitmap();
+    if (!image.HasAlpha())
+        image.InitAlpha();
+    unsigned char* rgb = image.GetData();
+    unsigned char* alpha = image.GetAlpha();
+    const long pixels = static_cast<long>(width) * height;
+    for (long i = 0; i < pixels; ++i, rgb += 3) {
+        const int v = static_cast<int>(kRed * rgb[0] + kGreen * rgb[1] + kBlue * rgb[2] + 0.5);
+        alpha[i] = static_cast<unsigned char>(light ? v : 255 - v);
+        rgb[0] = colour.Red();
+        rgb[1] = colour.Green();
+        rgb[2] = colour.Blue();
+    }
+    return wxBitmap(image);
+}
+
+wxBitmap DrawTextToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
+                          const wxString& text, const wxColour& colour, int alignment,
+                          int lineSpacing)
+{
+    wxArrayString lines;
+    for (wxString rest = text; !rest.empty(); rest = rest.AfterFirst('\n'))
+        lines.Add(rest.BeforeFirst('\n'));
+    return DrawTextLinesToBitmap(size, position, font, lines, colour, alignment, lineSpacing);
+}
+
+wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay, const wxPoint& position)
+{
+    if (!base.IsOk() || !overlay.IsOk())
+        return wxBitmap();
+    const wxPoint pos = position == wxDefaultPosition ? wxPoint(0, 0) : position;
+    const int left = std::max(pos.x, 0);
+    const int top = std::max(pos.y, 0);
+    const int right = std::min(base.GetWidth(), overlay.GetWidth() + pos.x);
+    const int bottom = std::min(base.GetHeight(), overlay.GetHeight() + pos.y);
+    const int fromX = std::max(-pos.x, 0);
+    const int fromY = std::max(-pos.y, 0);
+    if (right <= left || bottom <= top)
+        return base;
+
+    wxImage result = base.ConvertToImage();
+    wxImage over = overlay.ConvertToImage();
+    if (!result.IsOk() || !over.IsOk() || !result.GetData() || !over.GetData())
+        return base;
+    // A picture whose alpha is only 0 or 255 may come with a mask instead.
+    if (!result.HasAlpha())
+        result.InitAlpha();
+    if (!over.HasAlpha())
+        over.InitAlpha();
+
+    const int baseWidth = result.GetWidth();
+    const int overWidth = over.GetWidth();
+    for (int y = top; y < bottom; ++y) {
+        const long baseRow = static_cast<long>(y) * baseWidth;
+        const long overRow = static_cast<long>(y - top + fromY) * overWidth;
+        for (int x = left; x < right; ++x) {
+            const long b = baseRow + x;
+            const long o = overRow + x - left + fromX;
+            unsigned char* bc = result.GetData() + 3 * b;
+            const unsigned char* oc = over.GetData() + 3 * o;
+            const float ao = over.GetAlpha()[o] / 255.0f;
+            const float ab = result.GetAlpha()[b] / 255.0f;
+            const float a = ao + ab * (1.0f - ao);
+            if (a <= 0.0f) {
+                bc[0] = bc[1] = bc[2] = 0;
+                result.GetAlpha()[b] = 0;
+                continue;
+            }
+            for (int c = 0; c < 3; ++c)
+                bc[c] =
+                    static_cast<unsigned char>((oc[c] * ao + bc[c] * ab * (1.0f - ao)) / a + 0.5f);
+            result.GetAlpha()[b] = static_cast<unsigned char>(a * 255.0f + 0.5f);
+        }
+    }
+    return wxBitmap(result);
+}
+
+wxFont GetUIFont(int pointSize, int weight)
+{
+    int points = pointSize;
+    int numericWeight = wxFONTWEIGHT_NORMAL;
+    if (pointSize == -1 || weight == -1) {
+        points = 12;
+    } else if (weight == wxBOLD) {
+        numericWeight = wxFONTWEIGHT_BOLD;
+    } else if (weight == wxLIGHT) {
+        numericWeight = wxFONTWEIGHT_LIGHT;
+    } else if (weight != wxNORMAL && weight > 0 && weight <= 1000) {
+        numericWeight = weight;
+    }
+    return wxFont(wxFontInfo(points)
+                      .Family(wxFONTFAMILY_DEFAULT)
+                      .Style(wxFONTSTYLE_NORMAL)
+                      .FaceName("Tahoma")
+                      .Underlined(false)
+                      .Encoding(wxFONTENCODING_DEFAULT)
+                      .Weight(numericWeight));
+}

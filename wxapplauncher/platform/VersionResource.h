@@ -1,0 +1,29 @@
+// The version resource (VS_VERSIONINFO) of an executable, read the way the Windows
+// version functions read it: from a PE file's resources or from the ".rsrc" section
+// of an ELF file. Nothing is trusted: a malformed file is simply unreadable.
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+enum class VersionResourceResult
+{
+    Found,
+    Missing,  // no file, or a file without a version resource
+    Malformed // a version resource without a valid root block
+};
+
+// Reads the version resource of the file into block and checks its root block; on
+// Found, fixedInfoOffset is where the VS_FIXEDFILEINFO starts (its 52 bytes lie in block).
+VersionResourceResult ReadVersionResource(const std::string& path,
+                                          std::vector<unsigned char>& block,
+                                          std::size_t& fixedInfoOffset);
+
+class ByteSource;
+VersionResourceResult ReadVersionResource(const ByteSource& source,
+                                          std::vector<unsigned char>& block,
+                                          std::size_t& fixedInfoOffset);
+
+// Checks the root block of a version resource already in memory.
+bool FindFixedFileInfo(const std::vector<unsigned char>& block, std::size_t& fixedInfoOffset);
