@@ -18,16 +18,15 @@ function(veltrona_stage_demo source destination)
 
     set(output "${VELTRONA_DEMO_DIR}/${destination}")
     get_filename_component(outputDir "${output}" DIRECTORY)
-    set(installKind FILES)
-    set(binary FALSE)
+    # The copy keeps its source's permissions; a library needs no execute bits.
+    set(permissions USE_SOURCE_PERMISSIONS)
     if(TARGET "${source}")
         set(input "$<TARGET_FILE:${source}>")
         set(dependency "${source}")
         get_target_property(type "${source}" TYPE)
-        if(type STREQUAL "EXECUTABLE")
-            set(installKind PROGRAMS)
+        if(type MATCHES "_LIBRARY$")
+            set(permissions FILE_PERMISSIONS OWNER_READ OWNER_WRITE GROUP_READ WORLD_READ)
         endif()
-        set(binary TRUE)
     else()
         get_filename_component(input "${source}" ABSOLUTE)
         set(dependency "${input}")
@@ -50,22 +49,25 @@ function(veltrona_stage_demo source destination)
     endif()
     add_dependencies(demo ${stageTarget})
 
-    # install(TARGETS) cannot rename, so the staged copy is installed under its name;
-    # `cmake --install --strip` and the packages then strip it here.
+    # Installed from the staged copy, since install(TARGETS) cannot rename and a staged
+    # file may be a program made by a custom command. `cmake --install --strip` and the
+    # packages strip every ELF file.
     get_filename_component(name "${destination}" NAME)
     get_filename_component(subdir "${destination}" DIRECTORY)
     set(installDir "${VELTRONA_INSTALL_DIR}")
     if(subdir)
         string(APPEND installDir "/${subdir}")
     endif()
-    install(${installKind} "${output}" DESTINATION "${installDir}" RENAME "${name}"
-            COMPONENT ${stage_COMPONENT})
-    if(binary)
-        install(CODE "if(CMAKE_INSTALL_DO_STRIP)
-                execute_process(COMMAND \"${CMAKE_STRIP}\"
-                    \"\$ENV{DESTDIR}\${CMAKE_INSTALL_PREFIX}/${installDir}/${name}\"
-                    COMMAND_ERROR_IS_FATAL ANY)
-            endif()"
-            COMPONENT ${stage_COMPONENT})
-    endif()
+    list(JOIN permissions " " permissions)
+    string(CONFIGURE [=[
+        file(INSTALL "@output@" DESTINATION "${CMAKE_INSTALL_PREFIX}/@installDir@"
+             RENAME "@name@" @permissions@)
+        if(CMAKE_INSTALL_DO_STRIP)
+            set(installed "$ENV{DESTDIR}${CMAKE_INSTALL_PREFIX}/@installDir@/@name@")
+            file(READ "${installed}" magic LIMIT 4 HEX)
+            if(magic STREQUAL "7f454c46")
+                execute_process(COMMAND "@CMAKE_STRIP@" "${installed}" COMMAND_ERROR_IS_FATAL ANY)
+            endif()
+        endif()]=] code @ONLY)
+    install(CODE "${code}" COMPONENT ${stage_COMPONENT})
 endfunction()
