@@ -6,11 +6,7 @@ set -euo pipefail
 build="$1"
 work="$(mktemp -d "${TMPDIR:-/tmp}/installed-tree.XXXXXX")"
 launcher=""
-cleanup() {
-    [ -z "$launcher" ] || kill "$launcher" 2>/dev/null || true
-    rm -rf "$work"
-}
-trap cleanup EXIT
+trap '[ -z "$launcher" ] || kill "$launcher" 2>/dev/null; rm -rf "$work"' EXIT
 fail() { echo "FAIL: $*" >&2; exit 1; }
 
 prefix="/opt/Veltrona \"suite\" it's"
@@ -37,7 +33,6 @@ mkdir -m 700 "$work/run"
 export XDG_RUNTIME_DIR="$work/run" XDG_CONFIG_HOME="$work/config" XDG_DATA_HOME="$work/data"
 export XDG_DATA_DIRS="$work/share:/usr/share" PATH="$root/bin:$PATH"
 export VELTRONA_STANDIN_LOG="$work/standins.log" VELTRONA_STANDIN_EXIT=1
-log="$VELTRONA_STANDIN_LOG"
 
 # Runs "$@" until it succeeds, for at most 20 seconds.
 wait_until() {
@@ -62,7 +57,7 @@ close_launcher() {
 started() {
     awk -F '\t' -v arg="${2-}" '$1 == "exe" { exe = $2; hit = arg == "" }
         $1 == "arg" && $2 == arg { hit = 1 }
-        $1 == "end" && hit { print exe }' "$log" 2>/dev/null >"$work/started"
+        $1 == "end" && hit { print exe }' "$VELTRONA_STANDIN_LOG" 2>/dev/null >"$work/started"
     grep -qxF "$app/$1" "$work/started"
 }
 
@@ -78,8 +73,7 @@ xdotool windowactivate --sync "$window" mousemove --window "$window" 304 123 cli
 wait_until started "Quenta Print Studio.exe" || fail "the Printer button started nothing"
 xdotool key F1
 wait_until started "Help/Veltrona Help.exe" || fail "F1 did not start the help viewer"
-viewer="$(timeout 30 xdotool search --sync --onlyvisible --name '^Veltrona Help$' | head -n 1)"
-wmctrl -i -c "$viewer"
+wmctrl -i -c "$(timeout 30 xdotool search --sync --onlyvisible --name '^Veltrona Help$' | head -n 1)"
 close_launcher
 
 # A profile opened the way a file manager opens it reaches the Inspect module whole.
