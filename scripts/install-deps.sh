@@ -13,6 +13,7 @@ packages=(
     libgtest-dev
     googletest
     libx11-dev
+    libxtst-dev
     xvfb
     xauth
     openbox

@@ -4,26 +4,20 @@
 #include <gtest/gtest.h>
 #include <wx/image.h>
 
-#include <functional>
-
 namespace {
 
-wxImage Pixels(const wxBitmap& bitmap)
+wxImage Draw(const wxString& text, const wxColour& colour = *wxBLACK, int points = 12,
+             wxSize size = wxSize(-1, -1), wxPoint at = wxDefaultPosition, int spacing = 0)
 {
-    wxImage image = bitmap.ConvertToImage();
-    if (!image.HasAlpha())
+    wxImage image = DrawTextToBitmap(size, at, GetUIFont(points, wxNORMAL), text, colour,
+                                     wxALIGN_CENTER_VERTICAL * (at.y != -1), spacing)
+                        .ConvertToImage();
+    if (image.IsOk() && !image.HasAlpha())
         image.InitAlpha();
     return image;
 }
 
-int LineHeight(int points)
-{
-    return DrawTextToBitmap(wxSize(-1, -1), wxDefaultPosition, GetUIFont(points, wxNORMAL), "a",
-                            *wxBLACK, 0, 0)
-        .GetHeight();
-}
-
-// The right-most column that has any coverage, -1 for none.
+// The right-most column with any coverage, -1 for none.
 int LastInkColumn(const wxImage& image)
 {
     for (int x = image.GetWidth() - 1; x >= 0; --x)
@@ -33,170 +27,115 @@ int LastInkColumn(const wxImage& image)
     return -1;
 }
 
-wxBitmap Filled(int w, int h, const wxColour& colour, unsigned char alpha)
+wxBitmap Filled(const wxColour& colour, unsigned char alpha, int side = 8)
 {
-    wxImage image(w, h);
-    image.SetRGB(wxRect(0, 0, w, h), colour.Red(), colour.Green(), colour.Blue());
+    wxImage image(side, side);
+    image.SetRGB(wxRect(0, 0, side, side), colour.Red(), colour.Green(), colour.Blue());
     image.InitAlpha();
-    memset(image.GetAlpha(), alpha, static_cast<size_t>(w) * h);
+    memset(image.GetAlpha(), alpha, side * side);
     return wxBitmap(image);
 }
 
 TEST(TextBitmapTest, DrawsText)
 {
-    const wxFont font = GetUIFont(12, wxNORMAL);
     const wxString text = "Hg Profile";
-    const wxImage white =
-        Pixels(DrawTextToBitmap(wxSize(-1, -1), wxDefaultPosition, font, text, *wxWHITE, 0, 0));
-    const wxImage black =
-        Pixels(DrawTextToBitmap(wxSize(-1, -1), wxDefaultPosition, font, text, *wxBLACK, 0, 0));
-    const int width10 = DrawTextToBitmap(wxSize(-1, -1), wxDefaultPosition, GetUIFont(10, wxNORMAL),
-                                         text, *wxBLACK, 0, 0)
-                            .GetWidth();
-    const int h = LineHeight(12);
-    struct Case
+    const wxImage white = Draw(text, *wxWHITE), black = Draw(text);
+    int lo = 255, hi = 0, worst = 0, notWhite = 0;
+    for (int i = 0; i < white.GetWidth() * white.GetHeight(); ++i) {
+        lo = std::min<int>(lo, white.GetAlpha()[i]);
+        hi = std::max<int>(hi, white.GetAlpha()[i]);
+        worst = std::max(worst, std::abs(black.GetAlpha()[i] - white.GetAlpha()[i]));
+        notWhite += white.GetData()[3 * i + 1] != 255;
+    }
+    EXPECT_EQ(lo, 0) << "clear around the glyphs";
+    EXPECT_EQ(hi, 255) << "opaque glyph cores";
+    EXPECT_EQ(notWhite, 0);
+    EXPECT_EQ(black.GetSize(), white.GetSize());
+    EXPECT_LE(worst, 48) << "black text has the alpha shape of white text";
+
+    const wxImage canvas = Draw("", wxColour(10, 20, 30), 12, wxSize(152, 58));
+    EXPECT_EQ(canvas.GetSize(), wxSize(152, 58));
+    EXPECT_EQ(LastInkColumn(canvas), -1) << "an empty text gives a transparent canvas";
+    EXPECT_EQ(canvas.GetGreen(151, 57), 20);
+
+    const int h = Draw("a").GetHeight();
+    const struct
     {
         const char* name;
-        std::function<bool()> holds;
+        int height, expected;
+    } heights[] = {
+        {"a, LF, LF, b: three lines", Draw("a\n\nb").GetHeight(), 3 * h},
+        {"a, LF: one line", Draw("a\n").GetHeight(), h},
+        {"spacing -1 overlaps a row",
+         Draw("a\nb", *wxBLACK, 12, wxSize(-1, -1), wxDefaultPosition, -1).GetHeight(), 2 * h - 2},
+        {"too narrow: shrinks one point at a time until it fits",
+         Draw(text, *wxBLACK, 12, wxSize(Draw(text, *wxBLACK, 10).GetWidth() + 2, -1)).GetHeight(),
+         Draw("a", *wxBLACK, 10).GetHeight()},
+        {"far too narrow: stops at 7 points", Draw(text, *wxBLACK, 12, wxSize(5, -1)).GetHeight(),
+         Draw("a", *wxBLACK, 7).GetHeight()},
     };
-    const Case cases[] = {
-        {"white text: white everywhere, opaque cores, clear around",
-         [&] {
-             int lo = 255, hi = 0;
-             for (int i = 0; i < white.GetWidth() * white.GetHeight(); ++i) {
-                 lo = std::min<int>(lo, white.GetAlpha()[i]);
-                 hi = std::max<int>(hi, white.GetAlpha()[i]);
-                 if (white.GetData()[3 * i] != 255 || white.GetData()[3 * i + 2] != 255)
-                     return false;
-             }
-             return lo == 0 && hi == 255;
-         }},
-        {"black text: black, same alpha shape as white",
-         [&] {
-             if (black.GetSize() != white.GetSize() || black.GetRed(3, 3) != 0)
-                 return false;
-             for (int i = 0; i < white.GetWidth() * white.GetHeight(); ++i)
-                 if (std::abs(black.GetAlpha()[i] - white.GetAlpha()[i]) > 48)
-                     return false;
-             return true;
-         }},
-        {"empty text with a size: fully transparent canvas in the colour",
-         [&] {
-             const wxImage canvas = Pixels(DrawTextToBitmap(wxSize(152, 58), wxDefaultPosition,
-                                                            font, "", wxColour(10, 20, 30), 0, 0));
-             return canvas.GetSize() == wxSize(152, 58) && LastInkColumn(canvas) == -1 &&
-                    canvas.GetGreen(151, 57) == 20;
-         }},
-        {"empty text, no size: invalid",
-         [&] {
-             return !DrawTextToBitmap(wxSize(-1, -1), wxDefaultPosition, font, "", *wxBLACK, 0, 0)
-                         .IsOk();
-         }},
-        {"too narrow: one point at a time down to the size that fits",
-         [&] {
-             return DrawTextToBitmap(wxSize(width10 + 2, -1), wxDefaultPosition, font, text,
-                                     *wxBLACK, 0, 0)
-                        .GetHeight() == LineHeight(10);
-         }},
-        {"far too narrow: stops at 7 points",
-         [&] {
-             return DrawTextToBitmap(wxSize(5, -1), wxDefaultPosition, font, text, *wxBLACK, 0, 0)
-                        .GetHeight() == LineHeight(7);
-         }},
-        {"a long label right of an icon shrinks instead of being cut",
-         [&] {
-             const wxImage label = Pixels(DrawTextToBitmap(wxSize(152, 58), wxPoint(70, 29), font,
-                                                           wxString::FromUTF8("Verknüpfung"),
-                                                           *wxBLACK, wxALIGN_CENTER_VERTICAL, 0));
-             const int last = LastInkColumn(label);
-             return last > 70 && last < 151;
-         }},
-        {"a, LF, LF, b: three lines; a, LF: one; spacing -1 overlaps a row",
-         [&] {
-             auto height = [&](const wxString& s, int spacing) {
-                 return DrawTextToBitmap(wxSize(-1, -1), wxDefaultPosition, font, s, *wxBLACK, 0,
-                                         spacing)
-                     .GetHeight();
-             };
-             return height("a\n\nb", 0) == 3 * h && height("a\n", 0) == h &&
-                    height("a\nb", -1) == 2 * h - 2;
-         }},
-        {"bottom alignment puts the text at the bottom edge",
-         [&] {
-             const wxImage bottom = Pixels(DrawTextToBitmap(
-                 wxSize(100, 3 * h), wxDefaultPosition, font, "H", *wxBLACK, wxALIGN_BOTTOM, 0));
-             for (int y = 0; y < 2 * h; ++y)
-                 for (int x = 0; x < 100; ++x)
-                     if (bottom.GetAlpha(x, y) != 0)
-                         return false;
-             return LastInkColumn(bottom) >= 0;
-         }},
-        {"GetUIFont: 8 bold Tahoma; -1 gives 12 regular",
-         [&] {
-             const wxFont bold = GetUIFont(8, wxBOLD);
-             const wxFont fallback = GetUIFont(-1, wxBOLD);
-             return bold.GetPointSize() == 8 && bold.GetWeight() == wxFONTWEIGHT_BOLD &&
-                    bold.GetFaceName() == "Tahoma" && fallback.GetPointSize() == 12 &&
-                    fallback.GetWeight() == wxFONTWEIGHT_NORMAL;
-         }},
-    };
-    for (const Case& c : cases)
-        EXPECT_TRUE(c.holds()) << c.name;
+    for (const auto& c : heights)
+        EXPECT_EQ(c.height, c.expected) << c.name;
+
+    // A label right of an icon shrinks to the room it has instead of being cut.
+    const wxImage label =
+        Draw(wxString::FromUTF8("Verknüpfung"), *wxBLACK, 12, wxSize(152, 58), wxPoint(70, 29));
+    EXPECT_GT(LastInkColumn(label), 70);
+    EXPECT_LT(LastInkColumn(label), 151);
+
+    const wxFont bold = GetUIFont(8, wxBOLD), fallback = GetUIFont(-1, wxBOLD);
+    EXPECT_EQ(bold.GetPointSize(), 8);
+    EXPECT_EQ(bold.GetWeight(), wxFONTWEIGHT_BOLD);
+    EXPECT_EQ(bold.GetFaceName(), "Tahoma");
+    EXPECT_EQ(fallback.GetPointSize(), 12);
+    EXPECT_EQ(fallback.GetWeight(), wxFONTWEIGHT_NORMAL);
 }
 
 TEST(TextBitmapTest, Composites)
 {
-    wxImage baseImage = Pixels(Filled(8, 8, wxColour(0, 0, 255), 255));
+    wxImage baseImage = Filled(wxColour(0, 0, 255), 255).ConvertToImage();
     baseImage.SetRGB(0, 0, 40, 50, 60);
     baseImage.SetAlpha(0, 0, 0);
     const wxBitmap base(baseImage);
-    const wxImage red = Pixels(Filled(4, 4, wxColour(255, 0, 0), 255));
+    const wxBitmap red = Filled(*wxRED, 255, 4);
     wxImage masked(4, 4);
     masked.SetRGB(wxRect(0, 0, 4, 4), 255, 0, 255);
     masked.SetRGB(1, 1, 0, 255, 0);
     masked.SetMaskColour(255, 0, 255);
 
-    struct Case
+    const struct
     {
         const char* name;
         wxBitmap overlay;
-        wxPoint at;
-        wxPoint probe;
-        wxColour expected; // alpha in the colour's alpha
+        wxPoint at, probe;
+        wxColour expected; // with alpha
+    } cases[] = {
+        {"opaque overlay: its pixels", red, {2, 2}, {5, 5}, {255, 0, 0, 255}},
+        {"opaque overlay: base outside it", red, {2, 2}, {6, 6}, {0, 0, 255, 255}},
+        {"negative position", red, {-2, -2}, {1, 1}, {255, 0, 0, 255}},
+        {"transparent overlay keeps the base", Filled(*wxRED, 0), {0, 0}, {3, 3}, {0, 0, 255, 255}},
+        {"transparent over transparent: black", Filled(*wxRED, 0), {0, 0}, {0, 0}, {0, 0, 0, 0}},
+        {"half over opaque mixes", Filled(*wxRED, 128), {0, 0}, {4, 4}, {128, 0, 127, 255}},
+        {"half over clear keeps its colour", Filled(*wxRED, 128), {0, 0}, {0, 0}, {255, 0, 0, 128}},
+        {"mask is clear", wxBitmap(masked), {4, 4}, {4, 4}, {0, 0, 255, 255}},
+        {"the rest of a masked overlay is opaque",
+         wxBitmap(masked),
+         {4, 4},
+         {5, 5},
+         {0, 255, 0, 255}},
+        {"wholly outside: a copy of the base", red, {8, 0}, {0, 0}, {40, 50, 60, 0}},
     };
-    const Case cases[] = {
-        {"opaque overlay: its pixels", wxBitmap(red), wxPoint(2, 2), wxPoint(5, 5),
-         wxColour(255, 0, 0, 255)},
-        {"opaque overlay: base outside it", wxBitmap(red), wxPoint(2, 2), wxPoint(6, 6),
-         wxColour(0, 0, 255, 255)},
-        {"negative position reads the overlay from inside", wxBitmap(red), wxPoint(-2, -2),
-         wxPoint(1, 1), wxColour(255, 0, 0, 255)},
-        {"transparent overlay keeps the base", Filled(8, 8, *wxRED, 0), wxDefaultPosition,
-         wxPoint(3, 3), wxColour(0, 0, 255, 255)},
-        {"transparent over transparent: black, alpha 0", Filled(8, 8, *wxRED, 0), wxDefaultPosition,
-         wxPoint(0, 0), wxColour(0, 0, 0, 0)},
-        {"half overlay over opaque base mixes", Filled(8, 8, *wxRED, 128), wxDefaultPosition,
-         wxPoint(4, 4), wxColour(128, 0, 127, 255)},
-        {"half overlay over clear base keeps its colour", Filled(8, 8, *wxRED, 128),
-         wxDefaultPosition, wxPoint(0, 0), wxColour(255, 0, 0, 128)},
-        {"masked overlay: mask is clear", wxBitmap(masked), wxPoint(4, 4), wxPoint(4, 4),
-         wxColour(0, 0, 255, 255)},
-        {"masked overlay: the rest is opaque", wxBitmap(masked), wxPoint(4, 4), wxPoint(5, 5),
-         wxColour(0, 255, 0, 255)},
-        {"wholly outside: a copy of the base", wxBitmap(red), wxPoint(8, 0), wxPoint(0, 0),
-         wxColour(40, 50, 60, 0)},
-    };
-    for (const Case& c : cases) {
-        const wxImage out = Pixels(CompositeBitmap(base, c.overlay, c.at));
+    for (const auto& c : cases) {
+        wxImage out = CompositeBitmap(base, c.overlay, c.at).ConvertToImage();
         const int x = c.probe.x, y = c.probe.y;
-        EXPECT_EQ(
-            wxColour(out.GetRed(x, y), out.GetGreen(x, y), out.GetBlue(x, y), out.GetAlpha(x, y)),
-            c.expected)
+        EXPECT_EQ(wxColour(out.GetRed(x, y), out.GetGreen(x, y), out.GetBlue(x, y),
+                           out.HasAlpha() ? out.GetAlpha(x, y) : 255),
+                  c.expected)
             << c.name;
     }
     EXPECT_FALSE(CompositeBitmap(wxBitmap(), base).IsOk());
     EXPECT_FALSE(CompositeBitmap(base, wxBitmap()).IsOk());
-    EXPECT_EQ(Pixels(base).GetAlpha(0, 0), 0) << "the base is left alone";
+    EXPECT_EQ(base.ConvertToImage().GetAlpha(0, 0), 0) << "the base is left alone";
 }
 
 } // namespace

@@ -1,11 +1,13 @@
 // The image button driven by real pointer events on a real window.
 #include "controls/ZelStaticBitmap.h"
 
+#include "support/DesktopTools.h"
 #include "support/GuiWait.h"
 
 #include <gtest/gtest.h>
 #include <wx/frame.h>
 #include <wx/image.h>
+#include <wx/panel.h>
 #include <wx/uiaction.h>
 
 #include <vector>
@@ -26,7 +28,7 @@ enum Action
     DOWN,
     UP,
     DCLICK,
-    HIDE_SHOW,
+    HIDE_SHOW
 };
 
 // An action and the state the button is in once it has been handled.
@@ -46,14 +48,18 @@ struct Case
 TEST(ZelStaticBitmapTest, FollowsThePointer)
 {
     auto* frame = new wxFrame(nullptr, wxID_ANY, "button", wxPoint(100, 100), wxSize(300, 200));
-    auto* button = new ZelStaticBitmap(frame, 1101, Solid(60, 40, *wxBLUE), wxPoint(20, 20),
-                                       wxDefaultSize, wxNO_BORDER);
+    auto* button = new ZelStaticBitmap(new wxPanel(frame), 1101, Solid(60, 40, *wxBLUE),
+                                       wxPoint(20, 20), wxDefaultSize, wxNO_BORDER);
     button->SetBitmapHover(Solid(60, 40, *wxGREEN));
     button->SetBitmapPressed(Solid(60, 40, *wxRED));
     int clicks = 0;
     frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) { clicks += e.GetId() == 1101; });
     frame->Show();
-    ASSERT_TRUE(WaitFor([&] { return button->IsShownOnScreen(); }));
+    // Placed by the window manager and painted where the pointer will go.
+    ASSERT_TRUE(WaitFor([&] {
+        const wxImage screen = ScreenPixels(button->GetScreenRect());
+        return screen.GetBlue(30, 20) == 255 && screen.GetGreen(30, 20) == 0;
+    }));
 
     const Case cases[] = {
         {"press, drag out, release outside", {{IN, 1}, {DOWN, 2}, {OUT, 0}, {UP, 0}}, 0},
@@ -61,9 +67,6 @@ TEST(ZelStaticBitmapTest, FollowsThePointer)
          {{IN, 1}, {DOWN, 2}, {OUT, 0}, {IN, 2}, {UP, 1}},
          1},
         {"double click", {{IN, 1}, {DCLICK, 1}}, 2},
-        {"entering with the button held down elsewhere",
-         {{OUT, 0}, {DOWN, 0}, {IN, 1}, {UP, 1}},
-         0},
         {"grab broken while pressed", {{IN, 1}, {DOWN, 2}, {HIDE_SHOW, 0}, {UP, 0}}, 0},
     };
     wxUIActionSimulator sim;
@@ -94,20 +97,28 @@ TEST(ZelStaticBitmapTest, FollowsThePointer)
     };
     for (const Case& c : cases) {
         // Presses of successive cases lie apart, so none makes a double click.
-        x += 11;
+        x += 9;
         clicks = 0;
         for (const Step& step : c.steps) {
             act(step.action);
+
             EXPECT_TRUE(WaitFor([&] { return button->GetState() == step.state; }))
                 << c.name << ": step " << step.action;
         }
         // Moving in and out again flushes every event the case caused.
         for (const Step& step : {Step{IN, 1}, Step{OUT, 0}}) {
             act(step.action);
+
             WaitFor([&] { return button->GetState() == step.state; });
         }
         EXPECT_EQ(clicks, c.clicks) << c.name;
     }
+    // A press elsewhere grabs the pointer for that window, so X sends the
+    // button no crossing; should one come, it shows hover, not pressed.
+    wxMouseEvent enter(wxEVT_ENTER_WINDOW);
+    enter.SetLeftDown(true);
+    button->ProcessWindowEvent(enter);
+    EXPECT_EQ(button->GetState(), 1);
     frame->Destroy();
 }
 

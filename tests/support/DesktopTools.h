@@ -14,6 +14,12 @@ unsigned long WindowOf(pid_t pid, const std::string& title);
 // Asks the window manager to close the window, as its close box does.
 void CloseWindow(unsigned long window);
 
+class wxImage;
+class wxRect;
+
+// What the screen shows in a rectangle given in screen coordinates.
+wxImage ScreenPixels(const wxRect& rect);
+
 // Minimises the window as its title bar's button does, through the window manager.
 void MinimiseWindow(unsigned long window);
 

@@ -246,7 +246,9 @@ void ZelStaticBitmap::OnMouse(wxMouseEvent& event)
     } else if (event.LeftUp()) {
         if (HasCapture())
             ReleaseMouse();
-        if (s == STATE_PRESSED)
+        // GTK may hand over the release before the motion that left the
+        // control: a release outside never clicks.
+        if (s == STATE_PRESSED && inside)
             SendClick();
         n = inside ? STATE_HOVER : STATE_NORMAL;
     } else if (event.LeftDClick()) {

@@ -1,0 +1,148 @@
+// The launcher view as a user sees it: the pixels on the screen, the buttons
+// under a real pointer, the processes a click starts.
+#include "controls/TextBitmap.h"
+#include "controls/ZelStaticBitmap.h"
+#include "frame/Veltro3AppFrame.h"
+#include "frame/Veltro3MainAppStandardView.h"
+
+#include "support/DesktopTools.h"
+#include "support/GuiWait.h"
+#include "support/StandinDir.h"
+#include "support/StandinLog.h"
+
+#include <gtest/gtest.h>
+#include <wx/uiaction.h>
+#include <wx/utils.h>
+
+namespace {
+
+const wxColour kViewColour(224, 223, 227);
+
+// Whether the screen shows `image` drawn over the button's background at
+// every pixel (off by a little at most, for rounding in the toolkit).
+bool Shows(ZelStaticBitmap* button, const wxBitmap& image)
+{
+    const wxImage screen = ScreenPixels(button->GetScreenRect());
+    const wxColour bg = button->GetBackgroundColour();
+    wxImage back(image.GetWidth(), image.GetHeight());
+    back.SetRGB(wxRect(back.GetSize()), bg.Red(), bg.Green(), bg.Blue());
+    const wxImage expected = CompositeBitmap(wxBitmap(back), image).ConvertToImage();
+    if (screen.GetSize() != expected.GetSize())
+        return false;
+    for (long i = 0; i < 3L * screen.GetWidth() * screen.GetHeight(); ++i)
+        if (std::abs(screen.GetData()[i] - expected.GetData()[i]) > 3)
+            return false;
+    return true;
+}
+
+// The left-most column of the label's dark ink right of the icon.
+int LabelStart(const wxImage& image)
+{
+    for (int x = 60; x < image.GetWidth(); ++x)
+        for (int y = 0; y < image.GetHeight(); ++y)
+            if (image.GetAlpha(x, y) > 128 && image.GetRed(x, y) < 100)
+                return x;
+    return -1;
+}
+
+TEST(LauncherViewTest, LooksAndStartsModules)
+{
+    StandinDir install({"Quenta Print Studio.exe", "Monitor/Zel Display Studio.exe",
+                        "Quenta Link Studio.exe", "ZelVerifyStudio.exe",
+                        "Quenta Inspect Studio.exe", "Quenta Edit Studio.exe"});
+    const std::string log = install.Path() + "/starts.log";
+    setenv("VELTRONA_STANDIN_LOG", log.c_str(), 1);
+    setenv("VELTRONA_STANDIN_EXIT", "1", 1);
+    wxSetWorkingDirectory(install.Path());
+
+    auto* frame = new Veltro3AppFrame("Veltrona", wxPoint(50, 50), wxDefaultSize);
+    Veltro3MainAppStandardView* view = frame->GetStandardView();
+    auto button = [&](int id) { return static_cast<ZelStaticBitmap*>(view->FindWindow(id)); };
+    ZelStaticBitmap* printer = button(1101);
+    frame->Show();
+    // Placed by the window manager and painted.
+    ASSERT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
+    EXPECT_EQ(view->GetSize(), wxSize(564, 344));
+    EXPECT_FALSE(view->GetDropTarget());
+
+    // The column titles are drawn dark over the light picture.
+    const wxImage titles = ScreenPixels(view->GetScreenRect());
+    int dark = 0;
+    for (int x = 250; x < 330; ++x)
+        dark += titles.GetRed(x, 30) < 80;
+    EXPECT_GT(dark, 5);
+
+    // Normal, hover and pressed look on the screen, under a real pointer.
+    wxUIActionSimulator sim;
+    auto pointAt = [&](wxWindow* w) {
+        const wxRect r = w->GetScreenRect();
+        sim.MouseMove(r.GetLeft() + r.width / 2, r.GetTop() + r.height / 2);
+    };
+    pointAt(printer);
+    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapHover()); }));
+    sim.MouseDown();
+    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapPressed()); }));
+    sim.MouseMove(view->GetScreenPosition() + wxPoint(5, 100));
+    sim.MouseUp();
+    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
+
+    // The hover image has the highlight behind icon and label; the pressed
+    // label sits one pixel further left.
+    const wxImage normal = printer->GetBitmap().ConvertToImage();
+    const wxImage hover = printer->GetBitmapHover().ConvertToImage();
+    EXPECT_EQ(normal.GetAlpha(100, 4), 0);
+    EXPECT_GT(hover.GetAlpha(100, 4), 100);
+    EXPECT_GT(hover.GetAlpha(30, 50), 100) << "below the icon";
+    EXPECT_GT(LabelStart(hover), 60);
+    EXPECT_EQ(LabelStart(printer->GetBitmapPressed().ConvertToImage()), LabelStart(hover) - 1);
+
+    // A system colour change gives Inspect and Edit the view colour again.
+    button(1104)->SetBackgroundColour(*wxRED);
+    button(1103)->SetBackgroundColour(*wxRED);
+    wxSysColourChangedEvent changed;
+    view->ProcessWindowEvent(changed);
+    EXPECT_EQ(button(1104)->GetBackgroundColour(), kViewColour);
+    EXPECT_EQ(button(1103)->GetBackgroundColour(), kViewColour);
+
+    // Where each button sits, and what a real click on it starts.
+    int helpClicks = 0;
+    frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) {
+        helpClicks += e.GetId() == 1106;
+        e.Skip();
+    });
+    const struct
+    {
+        int id;
+        wxPoint at;
+        const char* exe;
+    } buttons[] = {
+        {1101, {228, 68}, "Quenta Print Studio.exe"},
+        {1100, {228, 155}, "Monitor/Zel Display Studio.exe"},
+        {1102, {228, 237}, "Quenta Link Studio.exe"},
+        {1104, {405, 68}, "Quenta Inspect Studio.exe"},
+        {1103, {405, 155}, "Quenta Edit Studio.exe"},
+        {1105, {405, 237}, "ZelVerifyStudio.exe"},
+        {1106, {10, 304}, nullptr},
+    };
+    size_t started = 0;
+    for (const auto& b : buttons) {
+        ZelStaticBitmap* target = button(b.id);
+        ASSERT_TRUE(target) << b.id;
+        EXPECT_EQ(target->GetPosition(), b.at) << b.id;
+        EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
+        EXPECT_EQ(target->GetCursor().IsOk(), b.exe != nullptr) << "hand cursor on modules only";
+        pointAt(target);
+        sim.MouseClick();
+        if (!b.exe)
+            continue;
+        EXPECT_EQ(target->GetSize(), wxSize(152, 58)) << b.id;
+        const auto records = WaitForRecords(log, ++started);
+        ASSERT_EQ(records.size(), started) << b.exe;
+        EXPECT_EQ(records.back().exe, install.Path() + "/" + b.exe);
+    }
+    EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; })) << "the Help button reaches the frame";
+    EXPECT_EQ(SettledRecords(log).size(), started);
+    frame->Destroy();
+}
+
+} // namespace
