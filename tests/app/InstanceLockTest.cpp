@@ -8,55 +8,44 @@
 
 #include <csignal>
 #include <memory>
-#include <sys/stat.h>
 
 namespace {
 
 TEST(InstanceLockTest, TenCopiesAtOnceGiveOneAndAKilledCopyBlocksNone)
 {
     StandinDir install({});
-    StandinDir runtime({});
-    chmod(runtime.Path().c_str(), 0700);
-    const EnvList env = {{"XDG_RUNTIME_DIR", runtime.Path()}};
-
-    const int rounds = 6;
-    for (int round = 0; round < rounds; ++round) {
-        std::vector<std::unique_ptr<ProbeRun>> copies;
+    const EnvList env = {{"XDG_RUNTIME_DIR", install.Path()}};
+    for (int round = 0; round < 6; ++round) {
+        SCOPED_TRACE(round);
+        std::vector<std::unique_ptr<ProbeRun>> running, ended;
         for (int i = 0; i < 10; ++i)
-            copies.push_back(
+            running.push_back(
                 std::make_unique<ProbeRun>(install.Path(), std::vector<std::string>{}, env));
         // Nine end without a window; the one left runs.
-        std::vector<bool> ended(copies.size(), false);
-        size_t endedCount = 0;
         ASSERT_TRUE(WaitFor(
             [&] {
-                for (size_t i = 0; i < copies.size(); ++i) {
+                for (auto copy = running.begin(); copy != running.end();) {
                     int status = 0;
-                    if (!ended[i] && copies[i]->WaitForExit(0, status)) {
-                        ended[i] = true;
-                        ++endedCount;
+                    if ((*copy)->WaitForExit(0, status)) {
+                        ended.push_back(std::move(*copy));
+                        copy = running.erase(copy);
+                    } else {
+                        ++copy;
                     }
                 }
-                return endedCount >= copies.size() - 1;
+                return running.size() <= 1;
             },
-            30000))
-            << "round " << round << ": " << endedCount << " ended";
-        ProbeRun* running = nullptr;
-        for (size_t i = 0; i < copies.size(); ++i) {
-            if (ended[i])
-                EXPECT_TRUE(copies[i]->Events("shown").empty()) << "round " << round;
-            else
-                running = copies[i].get();
-        }
-        ASSERT_NE(running, nullptr) << "round " << round;
-
+            30000));
+        ASSERT_EQ(running.size(), 1u);
+        for (const auto& copy : ended)
+            EXPECT_TRUE(copy->Events("shown").empty());
         // The last round's copy shows its frame; the others are killed outright.
-        if (round == rounds - 1) {
-            EXPECT_TRUE(running->WaitForShown()) << "round " << round;
+        if (round == 5) {
+            EXPECT_TRUE(running[0]->WaitForShown());
         }
-        running->Kill(SIGKILL);
+        running[0]->Kill(SIGKILL);
         int status = 0;
-        ASSERT_TRUE(running->WaitForExit(10000, status));
+        ASSERT_TRUE(running[0]->WaitForExit(10000, status));
     }
 }
 
