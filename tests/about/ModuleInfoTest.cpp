@@ -8,7 +8,6 @@
 #include <gtest/gtest.h>
 
 #include <wx/filefn.h>
-#include <wx/fs_mem.h>
 #include <wx/uiaction.h>
 
 #include <tuple>
@@ -68,15 +67,4 @@ TEST(ModuleInfo, WindowIsCentredAndClosesAtTheFirstPressAnywhereOrKey)
         EXPECT_TRUE(WaitFor([] { return OpenModuleWindow() == nullptr; }, 2500)) << action;
         EXPECT_EQ(wxWindow::GetCapture(), nullptr) << action;
     }
-}
-
-TEST(ModuleInfo, MissingPictureStillOpensAndCloses)
-{
-    ASSERT_TRUE(LoadCommonBitmap("Helper::ModuleSplash").IsOk());
-    wxMemoryFSHandler::RemoveFile("XRC_resource/CommonImages$images_modulesplash_zel.png");
-    ShowModuleInfo(1025);
-    ASSERT_NE(OpenModuleWindow(), nullptr);
-    EXPECT_TRUE(OpenModuleWindow()->HasCapture());
-    wxUIActionSimulator().MouseClick();
-    EXPECT_TRUE(WaitFor([] { return OpenModuleWindow() == nullptr; }, 2500));
 }

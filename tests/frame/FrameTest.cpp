@@ -76,8 +76,7 @@ TEST(FrameTest, FixedSizeAndExitClosesAtOnceWithoutAsking)
         destroyed = destroyed || event.GetEventObject() == frame;
         event.Skip();
     });
-    wxCommandEvent exit(wxEVT_MENU, 1007);
-    frame->ProcessWindowEvent(exit);
+    frame->ProcessCommand(1007);
     EXPECT_FALSE(frame->IsShown());
     EXPECT_TRUE(WaitFor([&] { return destroyed; }));
     EXPECT_TRUE(dialogs.Dialogs().empty());
