@@ -134,6 +134,8 @@ TEST(LauncherViewTest, LooksAndStartsModules)
         EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
         EXPECT_EQ(target->GetCursor().IsOk(), b.exe != nullptr) << "hand cursor on modules only";
         pointAt(target);
+        // Clicked only once the button has seen the pointer arrive.
+        ASSERT_TRUE(WaitFor([&] { return target->GetState() == 1; })) << b.id;
         sim.MouseClick();
         if (!b.exe)
             continue;
