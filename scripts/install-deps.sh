@@ -28,6 +28,14 @@ packages=(
     clang
     libclang-rt-14-dev
     libtsan2
+    dpkg-dev
+    file
+    lintian
+    desktop-file-utils
+    appstream
+    xdg-utils
+    libglib2.0-bin
+    shared-mime-info
     xdg-utils
     file
 )

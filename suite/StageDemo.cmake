@@ -1,16 +1,32 @@
-# veltrona_stage_demo(<target-or-file> <destination>) copies a built target's
-# file, or a plain file, to <destination> below ${CMAKE_BINARY_DIR}/demo/ and
-# makes the `demo` target (built by default) keep that copy up to date.
-# It may be called from any directory of the build.
+# veltrona_stage_demo(<target-or-file> <destination> [COMPONENT <component>]) copies a
+# built target's file, or a plain file, to <destination> below ${CMAKE_BINARY_DIR}/demo/
+# and makes the `demo` target (built by default) keep that copy up to date.
+# The same file is installed to <destination> below ${VELTRONA_INSTALL_DIR}, in the
+# install component given: `launcher`, or by default `standins` (the package of the
+# suite's stand-ins). It may be called from any directory of the build.
 
 set(VELTRONA_DEMO_DIR "${CMAKE_BINARY_DIR}/demo" CACHE INTERNAL "The demo installation")
+# The launcher runs from its own directory, so everything beside it shares this one.
+set(VELTRONA_INSTALL_DIR "${CMAKE_INSTALL_LIBDIR}/veltrona" CACHE INTERNAL
+    "The installed launcher's directory, relative to the prefix")
 
 function(veltrona_stage_demo source destination)
+    cmake_parse_arguments(PARSE_ARGV 2 stage "" "COMPONENT" "")
+    if(NOT stage_COMPONENT)
+        set(stage_COMPONENT standins)
+    endif()
+
     set(output "${VELTRONA_DEMO_DIR}/${destination}")
     get_filename_component(outputDir "${output}" DIRECTORY)
+    # The copy keeps its source's permissions; a library needs no execute bits.
+    set(permissions USE_SOURCE_PERMISSIONS)
     if(TARGET "${source}")
         set(input "$<TARGET_FILE:${source}>")
         set(dependency "${source}")
+        get_target_property(type "${source}" TYPE)
+        if(type MATCHES "_LIBRARY$")
+            set(permissions FILE_PERMISSIONS OWNER_READ OWNER_WRITE GROUP_READ WORLD_READ)
+        endif()
     else()
         get_filename_component(input "${source}" ABSOLUTE)
         set(dependency "${input}")
@@ -32,4 +48,26 @@ function(veltrona_stage_demo source destination)
         add_custom_target(demo ALL)
     endif()
     add_dependencies(demo ${stageTarget})
+
+    # Installed from the staged copy, since install(TARGETS) cannot rename and a staged
+    # file may be a program made by a custom command. `cmake --install --strip` and the
+    # packages strip every ELF file.
+    get_filename_component(name "${destination}" NAME)
+    get_filename_component(subdir "${destination}" DIRECTORY)
+    set(installDir "${VELTRONA_INSTALL_DIR}")
+    if(subdir)
+        string(APPEND installDir "/${subdir}")
+    endif()
+    list(JOIN permissions " " permissions)
+    string(CONFIGURE [=[
+        file(INSTALL "@output@" DESTINATION "${CMAKE_INSTALL_PREFIX}/@installDir@"
+             RENAME "@name@" @permissions@)
+        if(CMAKE_INSTALL_DO_STRIP)
+            set(installed "$ENV{DESTDIR}${CMAKE_INSTALL_PREFIX}/@installDir@/@name@")
+            file(READ "${installed}" magic LIMIT 4 HEX)
+            if(magic STREQUAL "7f454c46")
+                execute_process(COMMAND "@CMAKE_STRIP@" "${installed}" COMMAND_ERROR_IS_FATAL ANY)
+            endif()
+        endif()]=] code @ONLY)
+    install(CODE "${code}" COMPONENT ${stage_COMPONENT})
 endfunction()

@@ -14,25 +14,23 @@
 #include <wx/uiaction.h>
 #include <wx/utils.h>
 
-namespace {
+#include <algorithm>
 
-const wxColour kViewColour(224, 223, 227);
+namespace {
 
 // Whether the screen shows `image` drawn over the button's background at
 // every pixel (off by a little at most, for rounding in the toolkit).
 bool Shows(ZelStaticBitmap* button, const wxBitmap& image)
 {
-    const wxImage screen = ScreenPixels(button->GetScreenRect());
     const wxColour bg = button->GetBackgroundColour();
     wxImage back(image.GetWidth(), image.GetHeight());
     back.SetRGB(wxRect(back.GetSize()), bg.Red(), bg.Green(), bg.Blue());
     const wxImage expected = CompositeBitmap(wxBitmap(back), image).ConvertToImage();
-    if (screen.GetSize() != expected.GetSize())
-        return false;
-    for (long i = 0; i < 3L * screen.GetWidth() * screen.GetHeight(); ++i)
-        if (std::abs(screen.GetData()[i] - expected.GetData()[i]) > 3)
-            return false;
-    return true;
+    const wxImage screen = ScreenPixels(button->GetScreenRect());
+    return screen.GetSize() == expected.GetSize() &&
+           std::equal(screen.GetData(),
+                      screen.GetData() + 3L * screen.GetWidth() * screen.GetHeight(),
+                      expected.GetData(), [](int a, int b) { return std::abs(a - b) <= 3; });
 }
 
 // The left-most column of the label's dark ink right of the icon.
@@ -97,48 +95,59 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     EXPECT_EQ(LabelStart(printer->GetBitmapPressed().ConvertToImage()), LabelStart(hover) - 1);
 
     // A system colour change gives Inspect and Edit the view colour again.
-    button(1104)->SetBackgroundColour(*wxRED);
-    button(1103)->SetBackgroundColour(*wxRED);
+    for (int id : {1104, 1103})
+        button(id)->SetBackgroundColour(*wxRED);
     wxSysColourChangedEvent changed;
     view->ProcessWindowEvent(changed);
-    EXPECT_EQ(button(1104)->GetBackgroundColour(), kViewColour);
-    EXPECT_EQ(button(1103)->GetBackgroundColour(), kViewColour);
+    for (int id : {1104, 1103})
+        EXPECT_EQ(button(id)->GetBackgroundColour(), wxColour(224, 223, 227)) << id;
 
-    // Where each button sits, and what a real click on it starts.
+    // Where each button sits, and what a real click on it starts: the same
+    // program, with the same arguments, as its File menu command.
     int helpClicks = 0;
     frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) {
         helpClicks += e.GetId() == 1106;
         e.Skip();
     });
+    const std::vector<std::string> verifyArgs = {"VLT", std::to_string(GetModuleLanguageId())};
     const struct
     {
-        int id;
+        int id, menu;
         wxPoint at;
         const char* exe;
+        std::vector<std::string> args;
     } buttons[] = {
-        {1101, {228, 68}, "Quenta Print Studio.exe"},
-        {1100, {228, 155}, "Monitor/Zel Display Studio.exe"},
-        {1102, {228, 237}, "Quenta Link Studio.exe"},
-        {1104, {405, 68}, "Quenta Inspect Studio.exe"},
-        {1103, {405, 155}, "Quenta Edit Studio.exe"},
-        {1105, {405, 237}, "ZelVerifyStudio.exe"},
-        {1106, {10, 304}, nullptr},
+        {1101, 1001, {228, 68}, "Quenta Print Studio.exe", {}},
+        {1100, 1002, {228, 155}, "Monitor/Zel Display Studio.exe", {}},
+        {1102, 1003, {228, 237}, "Quenta Link Studio.exe", {}},
+        {1104, 1005, {405, 68}, "Quenta Inspect Studio.exe", {}},
+        {1103, 1006, {405, 155}, "Quenta Edit Studio.exe", {}},
+        {1105, 1004, {405, 237}, "ZelVerifyStudio.exe", verifyArgs},
+        {1106, 0, {10, 304}, nullptr, {}},
     };
     size_t started = 0;
     for (const auto& b : buttons) {
         ZelStaticBitmap* target = button(b.id);
         ASSERT_TRUE(target) << b.id;
-        EXPECT_EQ(target->GetPosition(), b.at) << b.id;
+        // Help: its 24 by 24 picture with room for the frame around it.
+        EXPECT_EQ(target->GetRect(), wxRect(b.at, b.exe ? wxSize(152, 58) : wxSize(28, 30)));
         EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
         EXPECT_EQ(target->GetCursor().IsOk(), b.exe != nullptr) << "hand cursor on modules only";
         pointAt(target);
+        // Clicked only once the button has seen the pointer arrive.
+        ASSERT_TRUE(WaitFor([&] { return target->GetState() == 1; })) << b.id;
         sim.MouseClick();
         if (!b.exe)
             continue;
-        EXPECT_EQ(target->GetSize(), wxSize(152, 58)) << b.id;
+        ASSERT_EQ(WaitForRecords(log, ++started).size(), started) << b.exe;
+        frame->ProcessCommand(b.menu);
         const auto records = WaitForRecords(log, ++started);
         ASSERT_EQ(records.size(), started) << b.exe;
-        EXPECT_EQ(records.back().exe, install.Path() + "/" + b.exe);
+        for (size_t i = started - 2; i < started; ++i) {
+            EXPECT_EQ(records[i].exe, install.Path() + "/" + b.exe);
+            EXPECT_EQ(records[i].args, b.args) << b.exe;
+            EXPECT_EQ(records[i].cwd, install.Path());
+        }
     }
     EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; })) << "the Help button reaches the frame";
     EXPECT_EQ(SettledRecords(log).size(), started);
