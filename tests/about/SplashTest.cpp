@@ -1,5 +1,5 @@
-// The splash and About windows on the real display: their lines, where the text goes,
-// when they close and how the About text scrolls.
+// The splash and About windows on the real display: when they close and how the
+// About text scrolls.
 #include "about/Splash.h"
 #include "about/SplashScreen.h"
 #include "platform/ScreenCapture.h"
@@ -7,13 +7,9 @@
 
 #include <gtest/gtest.h>
 
-#include <gdk/gdk.h>
-#include <wx/translation.h>
 #include <wx/uiaction.h>
 
 #include <chrono>
-#include <cstdio>
-#include <fstream>
 
 namespace {
 
@@ -45,106 +41,7 @@ bool ShiftedUp(const wxImage& before, const wxImage& now, int from, int to, int 
     return true;
 }
 
-// Translations of the catalogue "Veltro" made by msgfmt from the given entries.
-class Catalogue : public wxTranslationsLoader
-{
-public:
-    explicit Catalogue(const std::vector<std::pair<std::string, std::string>>& entries)
-    {
-        const std::string po = testing::TempDir() + "extra.po", mo = po + ".mo";
-        std::ofstream out(po);
-        out << "msgid \"\"\nmsgstr \"Content-Type: text/plain; charset=UTF-8\\n\"\n";
-        for (const auto& e : entries)
-            out << "msgid \"" << e.first << "\"\nmsgstr \"" << e.second << "\"\n";
-        out.close();
-        EXPECT_EQ(std::system(("msgfmt -o '" + mo + "' '" + po + "'").c_str()), 0);
-        std::ifstream in(mo, std::ios::binary);
-        m_bytes.assign(std::istreambuf_iterator<char>(in), {});
-        std::remove(po.c_str());
-        std::remove(mo.c_str());
-    }
-    wxMsgCatalog* LoadCatalog(const wxString& domain, const wxString&) override
-    {
-        return wxMsgCatalog::CreateFromData(
-            wxScopedCharBuffer::CreateNonOwned(m_bytes.data(), m_bytes.size()), domain);
-    }
-    wxArrayString GetAvailableTranslations(const wxString&) const override
-    {
-        return wxArrayString(1, "de");
-    }
-
-private:
-    std::vector<char> m_bytes;
-};
-
 } // namespace
-
-TEST(Splash, ExtraLegalLinesFollowTheCatalogue)
-{
-    int count = 0;
-    const wxArrayString startup = SplashLines(true, count);
-    EXPECT_EQ(count, 7);
-    ASSERT_EQ(startup.size(), 7u);
-    EXPECT_EQ(startup[0], "Version: 3.1.2.01");
-
-    const struct
-    {
-        std::vector<std::pair<std::string, std::string>> entries;
-        int windowLines;
-    } cases[] = {
-        {{}, 17},
-        {{{"EXTRALEGAL_1", "Extra one"}}, 18},
-        {{{"EXTRALEGAL_2", "Extra two"}}, 17},
-        {{{"EXTRALEGAL_1", "Extra one"}, {"EXTRALEGAL_2", "Extra two"}}, 19},
-    };
-    for (const auto& c : cases) {
-        auto* translations = new wxTranslations;
-        translations->SetLanguage("de");
-        translations->SetLoader(new Catalogue(c.entries));
-        wxTranslations::Set(translations);
-        ASSERT_TRUE(translations->AddCatalog("Veltro"));
-        const wxArrayString lines = SplashLines(false, count);
-        EXPECT_EQ(count, c.windowLines);
-        EXPECT_EQ(int(lines.size()), 68 + c.windowLines);
-        EXPECT_EQ(lines[16], "By using this program, you accept its terms.");
-        if (c.windowLines > 17) {
-            EXPECT_EQ(lines[17], "Extra one");
-        }
-        if (c.windowLines > 18) {
-            EXPECT_EQ(lines[18], "Extra two");
-        }
-        EXPECT_EQ(lines[count], "");
-        EXPECT_EQ(lines.Last(), "");
-    }
-    wxTranslations::Set(nullptr);
-}
-
-TEST(Splash, TextWindowStaysWithinTheMarginsLeftFirst)
-{
-    const struct
-    {
-        int centreX, centreY, textWidth;
-        wxRect expected;
-    } cases[] = {
-        {192, 372, 200, {92, 313, 200, 119}},
-        {400, 372, 100, {295, 313, 100, 119}}, // right margin
-        {192, 372, 360, {48, 313, 360, 119}},  // wider than the picture minus margins
-        {192, 50, 200, {92, 48, 200, 119}},    // top margin
-    };
-    for (const auto& c : cases)
-        EXPECT_EQ(PlaceTextWindow(443, {c.textWidth, 900}, {c.centreX, c.centreY}, 119, 48),
-                  c.expected)
-            << c.centreX << "," << c.centreY << " " << c.textWidth;
-}
-
-TEST(Splash, LargeFontsDrawAtSevenPoints)
-{
-    wxFrame frame(nullptr, wxID_ANY, "fonts");
-    EXPECT_EQ(SplashTextFont(&frame).GetPointSize(), 8);
-    gdk_screen_set_resolution(gdk_screen_get_default(), 300);
-    EXPECT_EQ(SplashTextFont(&frame).GetPointSize(), 7);
-    gdk_screen_set_resolution(gdk_screen_get_default(), 96);
-}
 
 TEST(Splash, StartupSplashIgnoresInputAndClosesWhenItsTimerFires)
 {
@@ -155,14 +52,11 @@ TEST(Splash, StartupSplashIgnoresInputAndClosesWhenItsTimerFires)
     EXPECT_EQ(wxWindow::GetCapture(), nullptr)
         << "a pointer grab would take other programs' clicks";
     const wxRect area = splash->GetScreenRect();
-    EXPECT_EQ(area.GetSize(), wxSize(445, 425));
-    EXPECT_EQ(area.GetPosition(), wxPoint((1280 - 445) / 2, (1024 - 425) / 2));
+    EXPECT_EQ(area, wxRect((1280 - 445) / 2, (1024 - 425) / 2, 445, 425));
     wxUIActionSimulator input;
     input.MouseMove(area.GetPosition() + wxPoint(100, 100));
     input.MouseClick();
     input.Char('a');
-    input.MouseMove(5, 5);
-    input.MouseClick();
     ASSERT_TRUE(WaitFor([] { return OpenSplash() == nullptr; }, 10000));
     EXPECT_GE(MsSince(start), 2000);
 }
@@ -171,9 +65,8 @@ TEST(Splash, AboutBoxClosesAtTheFirstPressKeyOrActivation)
 {
     auto* other = new wxFrame(nullptr, wxID_ANY, "Other launcher window", {10, 10}, {200, 150});
     other->Show();
-    const char* actions[] = {"press on it", "press on another window", "key", "activation"};
     wxUIActionSimulator input;
-    for (const std::string action : actions) {
+    for (const std::string action : {"press", "key", "activation"}) {
         // The user opens the About box from the menu: the window manager sees input first.
         input.MouseMove(60, 80);
         input.MouseClick();
@@ -182,17 +75,13 @@ TEST(Splash, AboutBoxClosesAtTheFirstPressKeyOrActivation)
         ASSERT_NE(about, nullptr) << action;
         ASSERT_TRUE(WaitFor([&] { return about->IsActive(); })) << action;
         EXPECT_TRUE(about->HasCapture()) << action;
-        if (action == "press on it" || action == "press on another window") {
-            input.MouseMove(action == "press on it"
-                                ? about->GetScreenRect().GetPosition() + wxPoint(200, 200)
-                                : wxPoint(60, 80));
-            input.MouseDown();
-            input.MouseUp();
-        } else if (action == "key") {
+        if (action == "key") {
             input.Char('x');
-        } else {
+        } else if (action == "activation") {
             other->Raise();
             other->SetFocus();
+        } else {
+            input.MouseClick(); // on the other window: the pointer grab brings it to the box
         }
         EXPECT_TRUE(WaitFor([] { return OpenSplash() == nullptr; }, 2500)) << action;
         EXPECT_EQ(wxWindow::GetCapture(), nullptr) << action;
@@ -207,9 +96,7 @@ TEST(Splash, AboutTextStandsStillThenRisesOnePixelPerTickAndWrapsWithoutGap)
     wxImage blue(300, 200);
     blue.SetRGB(wxRect(0, 0, 300, 200), 0, 0, 255);
     const wxBitmap picture(blue);
-    wxArrayString lines;
-    for (const char* line : {"First line", "Second line", "Third line", "Fourth line"})
-        lines.Add(line);
+    const wxArrayString lines = wxSplit("First line\nSecond line\nThird line\nFourth line", '\n');
     const auto start = Clock::now();
     auto* about = new ZelAboutSplashScreen(-1, false, 3000, picture, lines, {150, 100}, 17, 20,
                                            *wxWHITE, true);
