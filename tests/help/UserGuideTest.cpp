@@ -10,10 +10,7 @@
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
 
-#include <gdk/gdk.h>
 #include <gtest/gtest.h>
-#include <wx/app.h>
-#include <wx/timer.h>
 #include <wx/uiaction.h>
 
 #include <filesystem>
@@ -28,7 +25,6 @@ const std::string kXdgOpen = "/usr/bin/xdg-open";
 class TestDesktop
 {
 public:
-    // The real opener needs the system's tools; the others must not find it.
     explicit TestDesktop(const std::string& opener = kXdgOpen)
         : m_dir({"pdfreader", "bin/xdg-open"}),
           m_env({{"XDG_DATA_HOME", Root() + "/data"},
@@ -85,7 +81,7 @@ TEST(UserGuideTest, GuideOfTheLanguageFolderOpensInTheReader)
     const struct
     {
         const char *language, *folder;
-    } cases[] = {{"de_DE", "de"}, {"it_IT", "en"}, {"", "en"}, {"zh_CN", "zh_CN"}, {"fr_FR", "fr"}};
+    } cases[] = {{"de_DE", "de"}, {"it_IT", "en"}, {"zh_CN", "zh_CN"}, {"fr_FR", "fr"}};
     for (const auto& test : cases) {
         SCOPED_TRACE(test.language);
         fs::remove(desktop.Log());
@@ -121,56 +117,22 @@ TEST(UserGuideTest, WithoutAReaderTheDialogAsksAgainOnlyAfterOK)
             return test.answer;
         });
         OpenUserGuide();
-        // This program's folder has no guide: a second question that finds
-        // the reader ends in the "not found." message.
+        // This program's folder has no guide: found, the reader gets a "not found." message.
         ASSERT_EQ(dialogs.Dialogs().size(), test.asksAgain ? 2u : 1u);
         EXPECT_EQ(dialogs.Dialogs()[0].caption, "Acrobat Reader not found");
     }
-
-    // Escape, the one way out besides OK, counts as not OK.
-    CAcrobatNotFoundDialog dialog(nullptr);
-    wxTimer giveUp;
-    giveUp.Bind(wxEVT_TIMER, [&](wxTimerEvent&) { dialog.EndModal(wxID_ABORT); });
-    giveUp.StartOnce(10000);
-    wxTheApp->CallAfter([&] {
-        WaitFor([&] { return dialog.IsActive(); }, 5000);
-        wxUIActionSimulator().Char(WXK_ESCAPE);
-    });
-    EXPECT_EQ(dialog.ShowModal(), wxID_CANCEL);
 }
 
-TEST(UserGuideTest, ReaderLinkLightsUpAndOpensItsAddressOrSaysWhyNot)
+TEST(UserGuideTest, ReaderLinkOpensItsAddressOrSaysWhyNot)
 {
     TestDesktop desktop(VELTRONA_STANDIN_PATH);
     DialogRecorder dialogs;
-    wxUIActionSimulator pointer;
-    pointer.MouseMove(0, 0);
     CAcrobatNotFoundDialog dialog(nullptr);
     dialog.Show();
-    ZelLinkText* link = dialog.m_link;
     // Placed by the window manager and ready for the pointer once active.
     ASSERT_TRUE(WaitFor([&] { return dialog.IsActive(); }));
-    const wxCursor before(wxCURSOR_CROSS);
-    link->SetCursor(before);
-    const auto lit = [&](const wxColour& colour) {
-        return WaitFor([&] { return link->GetForegroundColour() == colour; });
-    };
-    const wxPoint inside = link->GetScreenRect().GetLeftTop() + wxPoint(4, 4);
-
-    // The pointer leaves, or the window is deactivated while it is over the link.
-    for (bool byDeactivation : {false, true}) {
-        pointer.MouseMove(inside);
-        ASSERT_TRUE(lit(*wxRED));
-        EXPECT_EQ(gdk_cursor_get_cursor_type(link->GetCursor().GetCursor()), GDK_HAND2);
-        wxActivateEvent deactivate(wxEVT_ACTIVATE, false);
-        if (byDeactivation)
-            dialog.HandleWindowEvent(deactivate);
-        else
-            pointer.MouseMove(link->GetScreenRect().GetBottomRight() + wxPoint(40, 40));
-        EXPECT_TRUE(lit(*wxBLUE));
-        EXPECT_TRUE(link->GetCursor().IsSameAs(before));
-    }
-
+    wxUIActionSimulator pointer;
+    pointer.MouseMove(dialog.m_link->GetScreenRect().GetLeftTop() + wxPoint(4, 4));
     pointer.MouseClick();
     const auto records = WaitForRecords(desktop.Log(), 1);
     ASSERT_EQ(records.size(), 1u);
