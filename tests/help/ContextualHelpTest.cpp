@@ -1,7 +1,5 @@
 // Contextual help as a user meets it: the launcher's help command with the help
 // viewer installed, missing, or installed but never answering.
-#include "platform/Ipc.h"
-
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
@@ -65,18 +63,6 @@ TEST(ContextualHelpTest, HelpCommandShowsTheLauncherPageInTheViewer)
         EXPECT_EQ(events[0].fields,
                   (std::vector<std::string>{"Application", "LaunchPad$Launcher.html"}));
         EXPECT_EQ(events[1].fields, std::vector<std::string>{page});
-
-        // The viewer may talk back on the launcher's service: "Exit" changes nothing.
-        setenv("XDG_RUNTIME_DIR", runtime.Path().c_str(), 1);
-        IpcClient client;
-        EXPECT_EQ(client.Connect("LaunchPad", "Application"), nullptr);
-        std::unique_ptr<wxConnectionBase> toLauncher(client.Connect("LaunchPad", "IPC START"));
-        ASSERT_NE(toLauncher, nullptr);
-        toLauncher->Poke("Application", wxString("Exit"));
-        toLauncher.reset();
-        int status = 0;
-        EXPECT_FALSE(launcher.WaitForExit(500, status));
-        EXPECT_TRUE(launcher.Events("dialog").empty());
     }
 }
 
