@@ -1,6 +1,5 @@
-// The updater's schedule and its "Silent" mark, the start from the Help menu,
-// and the clean-up of its temporary files at start-up. The updater stand-in
-// records the "Silent" it finds when it starts.
+// The updater's schedule and "Silent" mark (its stand-in records the "Silent" it
+// finds), the start from the Help menu, the clean-up of its temporary files.
 #include "settings/UpdateCheck.h"
 #include "support/ProbeRun.h"
 #include "support/ScopedEnv.h"
@@ -47,7 +46,6 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
     } cases[] = {
         {"", "", true, {}, {}, ""},
         {"Next\\ Launch=Never\n", "", false, {}, {}, ""},
-        {NextLaunch(0), "", true, {}, {}, ""},
         {NextLaunch(1), "", false, {}, {}, ""},
         {NextLaunch(1, "x"), "", true, {}, {}, ""},
         {"", NextLaunch(1), false, {}, {}, ""},
