@@ -66,14 +66,12 @@ TEST(HelpToolTest, StatusesFollowThePagesOfTheUsersLanguage)
         SCOPED_TRACE(c.lang);
         StandinDir install({}), runtime({});
         for (const auto& [folder, page] :
-             {std::pair{c.launcherIn, "Launcher.html"}, {c.alternateIn, "AlternateHelp.html"}}) {
-            if (!*folder)
-                continue;
-            const fs::path file =
-                fs::path(install.Path()) / "Documentation" / folder / "Help" / page;
-            fs::create_directories(file.parent_path());
-            std::ofstream(file) << "<p>help</p>";
-        }
+             {std::pair{c.launcherIn, "Launcher.html"}, {c.alternateIn, "AlternateHelp.html"}})
+            if (*folder) {
+                const std::string dir = install.Path() + "/Documentation/" + folder + "/Help/";
+                fs::create_directories(dir);
+                std::ofstream(dir + page) << "<p>help</p>";
+            }
         fs::create_hard_link(VELTRONA_PROBE_PATH, install.Path() + "/Veltrona.exe");
         ProbeRun launcher(install.Path(), {},
                           {{"LANG", c.lang + std::string(".UTF-8")},
