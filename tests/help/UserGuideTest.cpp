@@ -117,7 +117,7 @@ TEST(UserGuideTest, WithoutAReaderTheDialogAsksAgainOnlyAfterOK)
             return test.answer;
         });
         OpenUserGuide();
-        // This program's folder has no guide: found, the reader gets a "not found." message.
+        // This program's folder has no guide: once a reader is found, "not found." follows.
         ASSERT_EQ(dialogs.Dialogs().size(), test.asksAgain ? 2u : 1u);
         EXPECT_EQ(dialogs.Dialogs()[0].caption, "Acrobat Reader not found");
     }
