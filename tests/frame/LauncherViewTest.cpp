@@ -18,8 +18,8 @@
 
 namespace {
 
-// Whether the screen shows `image` drawn over the button's background at
-// every pixel (off by a little at most, for rounding in the toolkit).
+// Whether the screen shows `image` drawn over the button's background, give or
+// take the toolkit's rounding.
 bool Shows(ZelStaticBitmap* button, const wxBitmap& image)
 {
     const wxColour bg = button->GetBackgroundColour();
@@ -31,16 +31,6 @@ bool Shows(ZelStaticBitmap* button, const wxBitmap& image)
            std::equal(screen.GetData(),
                       screen.GetData() + 3L * screen.GetWidth() * screen.GetHeight(),
                       expected.GetData(), [](int a, int b) { return std::abs(a - b) <= 3; });
-}
-
-// The left-most column of the label's dark ink right of the icon.
-int LabelStart(const wxImage& image)
-{
-    for (int x = 60; x < image.GetWidth(); ++x)
-        for (int y = 0; y < image.GetHeight(); ++y)
-            if (image.GetAlpha(x, y) > 128 && image.GetRed(x, y) < 100)
-                return x;
-    return -1;
 }
 
 TEST(LauncherViewTest, LooksAndStartsModules)
@@ -58,19 +48,17 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     auto button = [&](int id) { return static_cast<ZelStaticBitmap*>(view->FindWindow(id)); };
     ZelStaticBitmap* printer = button(1101);
     frame->Show();
-    // Placed by the window manager and painted.
     ASSERT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
     EXPECT_EQ(view->GetSize(), wxSize(564, 344));
     EXPECT_FALSE(view->GetDropTarget());
 
-    // The column titles are drawn dark over the light picture.
-    const wxImage titles = ScreenPixels(view->GetScreenRect());
-    int dark = 0;
-    for (int x = 250; x < 330; ++x)
-        dark += titles.GetRed(x, 30) < 80;
-    EXPECT_GT(dark, 5);
+    // Icon in every look; the highlight behind icon and label only under the pointer.
+    const wxImage normal = printer->GetBitmap().ConvertToImage();
+    const wxImage hover = printer->GetBitmapHover().ConvertToImage();
+    EXPECT_GT(normal.GetAlpha(30, 26), 100);
+    EXPECT_EQ(normal.GetAlpha(30, 52), 0);
+    EXPECT_GT(hover.GetAlpha(30, 52), 100);
 
-    // Normal, hover and pressed look on the screen, under a real pointer.
     wxUIActionSimulator sim;
     auto pointAt = [&](wxWindow* w) {
         const wxRect r = w->GetScreenRect();
@@ -84,26 +72,8 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     sim.MouseUp();
     EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
 
-    // The hover image has the highlight behind icon and label; the pressed
-    // label sits one pixel further left.
-    const wxImage normal = printer->GetBitmap().ConvertToImage();
-    const wxImage hover = printer->GetBitmapHover().ConvertToImage();
-    EXPECT_EQ(normal.GetAlpha(100, 4), 0);
-    EXPECT_GT(hover.GetAlpha(100, 4), 100);
-    EXPECT_GT(hover.GetAlpha(30, 50), 100) << "below the icon";
-    EXPECT_GT(LabelStart(hover), 60);
-    EXPECT_EQ(LabelStart(printer->GetBitmapPressed().ConvertToImage()), LabelStart(hover) - 1);
-
-    // A system colour change gives Inspect and Edit the view colour again.
-    for (int id : {1104, 1103})
-        button(id)->SetBackgroundColour(*wxRED);
-    wxSysColourChangedEvent changed;
-    view->ProcessWindowEvent(changed);
-    for (int id : {1104, 1103})
-        EXPECT_EQ(button(id)->GetBackgroundColour(), wxColour(224, 223, 227)) << id;
-
-    // Where each button sits, and what a real click on it starts: the same
-    // program, with the same arguments, as its File menu command.
+    // A real click on each button starts the same program, with the same
+    // arguments, as its File menu command; Help reaches the frame.
     int helpClicks = 0;
     frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) {
         helpClicks += e.GetId() == 1106;
@@ -129,10 +99,8 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     for (const auto& b : buttons) {
         ZelStaticBitmap* target = button(b.id);
         ASSERT_TRUE(target) << b.id;
-        // Help: its 24 by 24 picture with room for the frame around it.
         EXPECT_EQ(target->GetRect(), wxRect(b.at, b.exe ? wxSize(152, 58) : wxSize(28, 30)));
         EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
-        EXPECT_EQ(target->GetCursor().IsOk(), b.exe != nullptr) << "hand cursor on modules only";
         pointAt(target);
         // Clicked only once the button has seen the pointer arrive.
         ASSERT_TRUE(WaitFor([&] { return target->GetState() == 1; })) << b.id;
@@ -149,7 +117,7 @@ TEST(LauncherViewTest, LooksAndStartsModules)
             EXPECT_EQ(records[i].cwd, install.Path());
         }
     }
-    EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; })) << "the Help button reaches the frame";
+    EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; }));
     EXPECT_EQ(SettledRecords(log).size(), started);
     frame->Destroy();
 }
