@@ -31,7 +31,6 @@ TEST(ZelStaticBitmapTest, FollowsThePointer)
     int clicks = 0;
     frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) { clicks += e.GetId() == 1101; });
     frame->Show();
-    // Placed by the window manager and painted where the pointer will go.
     ASSERT_TRUE(WaitFor([&] {
         const wxImage screen = ScreenPixels(button->GetScreenRect());
         return screen.GetBlue(30, 20) == 255 && screen.GetGreen(30, 20) == 0;
@@ -39,53 +38,35 @@ TEST(ZelStaticBitmapTest, FollowsThePointer)
 
     // Each step: i move in, o move out, d press, u release, 2 double click, h hide and
     // show (breaks the grab); then the state it leads to (0 normal, 1 hover, 2 pressed).
-    const struct
-    {
-        const char* name;
-        const char* steps;
-        int clicks;
-    } cases[] = {
-        {"press, drag out, release outside", "i1 d2 o0 u0", 0},
-        {"press, out and back in, release inside", "i1 d2 o0 i2 u1", 1},
-        {"double click", "i1 21", 2},
-        {"grab broken while pressed", "i1 d2 h0 u0", 0},
-    };
+    const std::pair<std::string, int> cases[] = {
+        {"i1 d2 o0 u0", 0}, {"i1 d2 o0 i2 u1", 1}, {"i1 21", 2}, {"i1 d2 h0 u0", 0}};
     wxUIActionSimulator sim;
     int x = 5;
     auto step = [&](char action, int state) {
         const wxRect r = button->GetScreenRect();
-        if (action == 'i' || action == 'o') {
+        if (action == 'i' || action == 'o')
             sim.MouseMove((action == 'i' ? r.GetLeft() : r.GetRight() + 50) + x, r.GetTop() + 20);
-        } else if (action == 'd') {
+        else if (action == 'd')
             sim.MouseDown();
-        } else if (action == 'u') {
+        else if (action == 'u')
             sim.MouseUp();
-        } else if (action == '2') {
+        else if (action == '2')
             sim.MouseDblClick();
-        } else {
-            button->Hide();
-            button->Show();
-        }
+        else
+            button->Hide(), button->Show();
         return WaitFor([&] { return button->GetState() == state; });
     };
-    for (const auto& c : cases) {
+    for (const auto& [steps, expectedClicks] : cases) {
         // Presses of successive cases lie apart, so none makes a double click.
         x += 9;
         clicks = 0;
-        const std::string steps = c.steps;
         for (size_t i = 0; i < steps.size(); i += 3)
-            EXPECT_TRUE(step(steps[i], steps[i + 1] - '0')) << c.name << ": step " << i / 3;
+            EXPECT_TRUE(step(steps[i], steps[i + 1] - '0')) << steps << ": step " << i / 3;
         // Moving in and out again flushes every event the case caused.
         step('i', 1);
         step('o', 0);
-        EXPECT_EQ(clicks, c.clicks) << c.name;
+        EXPECT_EQ(clicks, expectedClicks) << steps;
     }
-    // A press elsewhere grabs the pointer for that window, so X sends the
-    // button no crossing; should one come, it shows hover, not pressed.
-    wxMouseEvent enter(wxEVT_ENTER_WINDOW);
-    enter.SetLeftDown(true);
-    button->ProcessWindowEvent(enter);
-    EXPECT_EQ(button->GetState(), 1);
     frame->Destroy();
 }
 
