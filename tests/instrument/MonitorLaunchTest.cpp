@@ -21,25 +21,21 @@ namespace {
 // A launcher frame in an installation of the Monitor stand-in, which logs its starts.
 struct Launcher
 {
-    Launcher() : install({"Monitor/Zel Display Studio.exe"}), log(install.Path() + "/starts.log")
+    Launcher()
     {
         setenv("VELTRONA_STANDIN_LOG", log.c_str(), 1);
         setenv("VELTRONA_STANDIN_EXIT", "1", 1);
         wxSetWorkingDirectory(install.Path());
         frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
     }
-    ~Launcher()
-    {
-        frame->Destroy();
-        wxSetWorkingDirectory("/");
-    }
+    ~Launcher() { frame->Destroy(), wxSetWorkingDirectory("/"); }
 
     void Launch() { frame->GetStandardView()->LaunchModule(1002, wxString()); }
     size_t Starts() const { return SettledRecords(log).size(); }
 
     DialogRecorder dialogs;
-    StandinDir install;
-    std::string log;
+    StandinDir install{{"Monitor/Zel Display Studio.exe"}};
+    std::string log = install.Path() + "/starts.log";
     Veltro3AppFrame* frame;
 };
 

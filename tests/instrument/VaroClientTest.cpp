@@ -1,6 +1,6 @@
 // The instrument client against the simulator library: one registration for all
 // clients, notifications posted to the GUI thread, measurements only while the
-// launcher is active, and destruction that waits for the client's workers.
+// launcher is active.
 #include "instrument/SimControl.h"
 #include "instrument/VaroEvents.h"
 #include "instrument/Varo_client.h"
@@ -20,40 +20,37 @@ namespace {
 
 using Events = std::multiset<std::string>;
 
-// Writes down each instrument event delivered, as "connected 1", "button 1" or
-// "measured 7", marking one handled off the GUI thread or that would not travel
-// up the window hierarchy.
+// Writes down each instrument event delivered ("connected 1", "button 1",
+// "measured 7"), marking one handled off the GUI thread or that would not
+// travel up the window hierarchy.
 struct Recorder : wxEventFilter
 {
     Recorder() { wxEvtHandler::AddFilter(this); }
     ~Recorder() override { wxEvtHandler::RemoveFilter(this); }
 
-    int FilterEvent(wxEvent& event) override
+    int FilterEvent(wxEvent& e) override
     {
-        const wxEventType type = event.GetEventType();
         std::string what;
-        auto* connection = dynamic_cast<zelVaroConnectionEvent*>(&event);
-        auto* button = dynamic_cast<zelVaroButtonEvent*>(&event);
-        auto* measurement = dynamic_cast<zelVaroMeasEvent*>(&event);
-        if (connection && type == zelEVT_Varo_CONNECTION)
-            what = "connected " + std::to_string(connection->m_connected);
-        else if (button && type == zelEVT_Varo_BUTTON)
-            what = "button " + std::to_string(button->m_pressed);
-        else if (measurement && type == zelEVT_Varo_MEAS)
-            what = "measured " + std::to_string(measurement->m_status);
+        if (auto* c = dynamic_cast<zelVaroConnectionEvent*>(&e);
+            c && e.GetEventType() == zelEVT_Varo_CONNECTION)
+            what = "connected " + std::to_string(c->m_connected);
+        else if (auto* b = dynamic_cast<zelVaroButtonEvent*>(&e);
+                 b && e.GetEventType() == zelEVT_Varo_BUTTON)
+            what = "button " + std::to_string(b->m_pressed);
+        else if (auto* m = dynamic_cast<zelVaroMeasEvent*>(&e);
+                 m && e.GetEventType() == zelEVT_Varo_MEAS)
+            what = "measured " + std::to_string(m->m_status);
         else
             return Event_Skip;
-        if (!wxThread::IsMain() || !event.ShouldPropagate())
-            what += " not as posted";
-        events.insert(what);
+        events.insert(what + (wxThread::IsMain() && e.ShouldPropagate() ? "" : " not as posted"));
         return Event_Skip;
     }
 
     Events events; // unordered: each notification has a worker of its own
 };
 
-// Lets every fired notification reach the clients, destroys them (which waits
-// for their workers) and delivers what the workers posted.
+// Lets every notification reach the clients, destroys them (which waits for
+// their workers) and delivers what the workers posted.
 template <typename Clients> void Finish(Clients& clients)
 {
     EXPECT_EQ(SIM(varosim_wait_idle)(10000), 0);
@@ -65,12 +62,10 @@ TEST(VaroClient, EveryLiveClientIsNotifiedThroughOneRegistration)
 {
     Recorder recorder;
     auto first = std::make_unique<Varo_client>(), second = std::make_unique<Varo_client>();
-    // Only the connection codes mean something to the launcher.
     for (const int code : {1000, 1, 2, 999})
         SIM(varosim_fire)(code, 0);
     Finish(second);
     Finish(first);
-    // A later client is reached through the first one's registration.
     auto later = std::make_unique<Varo_client>();
     SIM(varosim_fire)(1, 0);
     Finish(later);
@@ -103,8 +98,8 @@ TEST(VaroClient, ButtonMeasuresWithTheBeepOffOnlyWhileTheLauncherIsActive)
     EXPECT_STREQ(options, "Beep=no\nBeep=no\n");
 }
 
-// Also run under ThreadSanitizer, which reports any unguarded shared access
-// and any use of a destroyed client.
+// Also run under ThreadSanitizer: any unguarded shared access or use of a
+// destroyed client fails it.
 TEST(VaroClient, ClientsComeAndGoWhileTheLibraryNotifies)
 {
     Recorder recorder;
