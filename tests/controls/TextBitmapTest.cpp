@@ -70,10 +70,6 @@ TEST(TextBitmapTest, Composites)
     baseImage.SetRGB(0, 0, 40, 50, 60);
     baseImage.SetAlpha(0, 0, 0);
     const wxBitmap base(baseImage), red = Filled(*wxRED, 255, 4);
-    wxImage masked(4, 4);
-    masked.SetRGB(wxRect(0, 0, 4, 4), 255, 0, 255);
-    masked.SetRGB(1, 1, 0, 255, 0);
-    masked.SetMaskColour(255, 0, 255);
 
     const struct
     {
@@ -87,8 +83,6 @@ TEST(TextBitmapTest, Composites)
         {Filled(*wxRED, 0), {0, 0}, {0, 0}, {0, 0, 0, 0}},
         {Filled(*wxRED, 128), {0, 0}, {4, 4}, {128, 0, 127, 255}},
         {Filled(*wxRED, 128), {0, 0}, {0, 0}, {255, 0, 0, 128}},
-        {wxBitmap(masked), {4, 4}, {4, 4}, {0, 0, 255, 255}},
-        {wxBitmap(masked), {4, 4}, {5, 5}, {0, 255, 0, 255}},
         {red, {8, 0}, {0, 0}, {40, 50, 60, 0}},
     };
     for (const auto& c : cases) {

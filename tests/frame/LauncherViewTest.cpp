@@ -15,6 +15,7 @@
 #include <wx/utils.h>
 
 #include <algorithm>
+#include <string>
 
 namespace {
 
@@ -119,6 +120,38 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     }
     EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; }));
     EXPECT_EQ(SettledRecords(log).size(), started);
+
+    // Steps: i move in, o move out, d press, u release, 2 double click, h hide and
+    // show (breaks the grab); each with the state it leads to (0 normal, 1 hover, 2 pressed).
+    const std::pair<std::string, int> cases[] = {
+        {"i1 d2 o0 i2 u1", 1}, {"i1 21", 2}, {"i1 d2 h0 u0", 0}};
+    ZelStaticBitmap* help = button(1106);
+    int x = -6;
+    auto step = [&](char action, int state) {
+        const wxRect r = help->GetScreenRect();
+        if (action == 'i' || action == 'o')
+            sim.MouseMove((action == 'i' ? r.GetLeft() : r.GetRight() + 50) + x, r.GetTop() + 15);
+        else if (action == 'd')
+            sim.MouseDown();
+        else if (action == 'u')
+            sim.MouseUp();
+        else if (action == '2')
+            sim.MouseDblClick();
+        else
+            help->Hide(), help->Show();
+        return WaitFor([&] { return help->GetState() == state; });
+    };
+    for (const auto& [steps, clicks] : cases) {
+        // Presses of successive cases lie apart, so none makes a double click.
+        x += 10;
+        helpClicks = 0;
+        for (size_t i = 0; i < steps.size(); i += 3)
+            EXPECT_TRUE(step(steps[i], steps[i + 1] - '0')) << steps << ": step " << i / 3;
+        // Moving in and out again flushes every event the case caused.
+        step('i', 1);
+        step('o', 0);
+        EXPECT_EQ(helpClicks, clicks) << steps;
+    }
     frame->Destroy();
 }
 
