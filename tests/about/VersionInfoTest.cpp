@@ -1,13 +1,9 @@
 // The version reader over real PE files linked by the mingw tools and ELF files carrying
-// compiled resources, whole and damaged.
+// compiled resources.
 #include "about/VersionInfo.h"
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
-#include <cstdio>
-#include <fstream>
-#include <iterator>
 #include <stdexcept>
 
 namespace {
@@ -37,20 +33,4 @@ TEST(VersionInfo, ReadsTheProductVersionNotTheFileVersion)
     for (const auto& [file, expected] : cases)
         EXPECT_EQ(Read(kDir + file), expected) << file;
     EXPECT_EQ(GetLauncherVersion(), "3.1.2.01");
-}
-
-// Without the fixed info's signature the root block is no version.
-TEST(VersionInfo, DamagedVersionIsReportedAsSuch)
-{
-    const std::string copy = testing::TempDir() + "damaged", signature = "\xBD\x04\xEF\xFE";
-    for (const char* file : {"pe-3.0.21.7", "elf-1.2.3.0"}) {
-        std::ifstream in(kDir + file, std::ios::binary);
-        std::vector<char> bytes(std::istreambuf_iterator<char>(in), {});
-        auto at = std::search(bytes.begin(), bytes.end(), signature.begin(), signature.end());
-        ASSERT_NE(at, bytes.end()) << file;
-        *at = 0;
-        std::ofstream(copy, std::ios::binary).write(bytes.data(), long(bytes.size()));
-        EXPECT_EQ(Read(copy), "VersionInfo: can not retrieve version information") << file;
-    }
-    std::remove(copy.c_str());
 }

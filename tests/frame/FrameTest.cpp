@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 #include <wx/menu.h>
+#include <wx/weakref.h>
 
 namespace {
 
@@ -47,14 +48,10 @@ TEST(FrameTest, MenusFixedSizeAndExitWithoutAsking)
     frame->SetSize(900, 700);
     EXPECT_EQ(frame->GetSize(), size);
 
-    bool destroyed = false;
-    frame->Bind(wxEVT_DESTROY, [&](wxWindowDestroyEvent& event) {
-        destroyed = destroyed || event.GetEventObject() == frame;
-        event.Skip();
-    });
+    const wxWeakRef<wxFrame> alive(frame);
     frame->ProcessCommand(1007);
     EXPECT_FALSE(frame->IsShown());
-    EXPECT_TRUE(WaitFor([&] { return destroyed; }));
+    EXPECT_TRUE(WaitFor([&] { return !alive; }));
     EXPECT_TRUE(dialogs.Dialogs().empty());
 }
 
