@@ -73,8 +73,8 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     sim.MouseUp();
     EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
 
-    // A real click on each button starts the same program, with the same
-    // arguments, as its File menu command; Help reaches the frame.
+    // A real click on each button starts its module with its arguments, as its
+    // File menu command does; Help reaches the frame.
     int helpClicks = 0;
     frame->Bind(wxEVT_BUTTON, [&](wxCommandEvent& e) {
         helpClicks += e.GetId() == 1106;
