@@ -52,8 +52,8 @@ TEST(TextBitmapTest, DrawsText)
         worst = std::max(worst, std::abs(black.GetAlpha()[i] - alpha[i]));
     EXPECT_LE(worst, 48) << "black text has the alpha shape of white text";
 
+    EXPECT_EQ(Draw("a\n\nb").GetHeight(), 3 * Draw("a").GetHeight()) << "empty lines count";
     // Too narrow: one point smaller at a time until it fits, down to 7 points.
-    EXPECT_EQ(Draw("a\n\nb").GetHeight(), 3 * Draw("a").GetHeight());
     EXPECT_EQ(Draw(text, 12, wxSize(Draw(text, 10).GetWidth() + 2, -1)).GetHeight(),
               Draw("a", 10).GetHeight());
     EXPECT_EQ(Draw(text, 12, wxSize(5, -1)).GetHeight(), Draw("a", 7).GetHeight());

@@ -46,9 +46,8 @@ TEST_F(LaunchModuleTest, FilesReachInspectAndMissingModulesStartNothing)
 {
     const std::string awkward = m_install.Path() + "/dir with blanks/a \"b\" c.icc";
     m_frame->OpenInInspect(wxString::FromUTF8(awkward));
-    wxArrayString dropped;
-    for (const char* name : {"/tmp/first.icc", "/tmp/second.icc"})
-        dropped.Add(name);
+    const wxString names[] = {"/tmp/first.icc", "/tmp/second.icc"};
+    const wxArrayString dropped(2, names);
     EXPECT_TRUE(DragNDrop(m_frame->GetStandardView(), 1005).OnDropFiles(0, 0, dropped));
     std::multiset<std::vector<std::string>> opened;
     for (const StandinRecord& record : SettledRecords(m_log))

@@ -16,11 +16,11 @@
 
 #include <algorithm>
 #include <string>
+#include <tuple>
 
 namespace {
 
-// Whether the screen shows `image` drawn over the button's background, give or
-// take the toolkit's rounding.
+// Whether the screen shows `image` over the button's background, give or take rounding.
 bool Shows(ZelStaticBitmap* button, const wxBitmap& image)
 {
     const wxColour bg = button->GetBackgroundColour();
@@ -55,10 +55,9 @@ TEST(LauncherViewTest, LooksAndStartsModules)
 
     // Icon in every look; the highlight behind icon and label only under the pointer.
     const wxImage normal = printer->GetBitmap().ConvertToImage();
-    const wxImage hover = printer->GetBitmapHover().ConvertToImage();
     EXPECT_GT(normal.GetAlpha(30, 26), 100);
     EXPECT_EQ(normal.GetAlpha(30, 52), 0);
-    EXPECT_GT(hover.GetAlpha(30, 52), 100);
+    EXPECT_GT(printer->GetBitmapHover().ConvertToImage().GetAlpha(30, 52), 100);
 
     wxUIActionSimulator sim;
     auto pointAt = [&](wxWindow* w) {
@@ -112,11 +111,9 @@ TEST(LauncherViewTest, LooksAndStartsModules)
         frame->ProcessCommand(b.menu);
         const auto records = WaitForRecords(log, ++started);
         ASSERT_EQ(records.size(), started) << b.exe;
-        for (size_t i = started - 2; i < started; ++i) {
-            EXPECT_EQ(records[i].exe, install.Path() + "/" + b.exe);
-            EXPECT_EQ(records[i].args, b.args) << b.exe;
-            EXPECT_EQ(records[i].cwd, install.Path());
-        }
+        for (size_t i = started - 2; i < started; ++i)
+            EXPECT_EQ(std::tie(records[i].exe, records[i].args, records[i].cwd),
+                      std::make_tuple(install.Path() + "/" + b.exe, b.args, install.Path()));
     }
     EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; }));
     EXPECT_EQ(SettledRecords(log).size(), started);

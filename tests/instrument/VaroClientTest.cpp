@@ -1,6 +1,4 @@
-// The instrument client against the simulator library: one registration for all
-// clients, notifications posted to the GUI thread, measurements only while the
-// launcher is active.
+// The instrument client against the simulator library.
 #include "instrument/SimControl.h"
 #include "instrument/VaroEvents.h"
 #include "instrument/Varo_client.h"
@@ -20,9 +18,8 @@ namespace {
 
 using Events = std::multiset<std::string>;
 
-// Writes down each instrument event delivered ("connected 1", "button 1",
-// "measured 7"), marking one handled off the GUI thread or that would not
-// travel up the window hierarchy.
+// Each instrument event delivered ("button 1"), marked when handled off the GUI
+// thread or unable to travel up the window hierarchy.
 struct Recorder : wxEventFilter
 {
     Recorder() { wxEvtHandler::AddFilter(this); }
@@ -30,16 +27,15 @@ struct Recorder : wxEventFilter
 
     int FilterEvent(wxEvent& e) override
     {
+        const wxEventType type = e.GetEventType();
         std::string what;
-        if (auto* c = dynamic_cast<zelVaroConnectionEvent*>(&e);
-            c && e.GetEventType() == zelEVT_Varo_CONNECTION)
-            what = "connected " + std::to_string(c->m_connected);
-        else if (auto* b = dynamic_cast<zelVaroButtonEvent*>(&e);
-                 b && e.GetEventType() == zelEVT_Varo_BUTTON)
-            what = "button " + std::to_string(b->m_pressed);
-        else if (auto* m = dynamic_cast<zelVaroMeasEvent*>(&e);
-                 m && e.GetEventType() == zelEVT_Varo_MEAS)
-            what = "measured " + std::to_string(m->m_status);
+        if (type == zelEVT_Varo_CONNECTION)
+            what =
+                "connected " + std::to_string(dynamic_cast<zelVaroConnectionEvent&>(e).m_connected);
+        else if (type == zelEVT_Varo_BUTTON)
+            what = "button " + std::to_string(dynamic_cast<zelVaroButtonEvent&>(e).m_pressed);
+        else if (type == zelEVT_Varo_MEAS)
+            what = "measured " + std::to_string(dynamic_cast<zelVaroMeasEvent&>(e).m_status);
         else
             return Event_Skip;
         events.insert(what + (wxThread::IsMain() && e.ShouldPropagate() ? "" : " not as posted"));

@@ -89,7 +89,6 @@ TEST_P(MenusInLanguage, FileAndHelpMenusAreTranslated)
     for (const char* name : {"LANGUAGE", "LC_ALL", "LC_MESSAGES"})
         unsetenv(name);
     setenv("LANG", (GetParam().first + ".UTF-8").c_str(), 1);
-    // Start-up's steps.
     wxLocale locale;
     DecideUserLanguage();
     InitLocale(locale);
