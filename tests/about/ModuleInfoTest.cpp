@@ -17,8 +17,7 @@ TEST(ModuleInfo, LinesShowTheProductVersionOrNA)
                            install.Path() + "/Quenta Print Studio.exe"));
     wxSetWorkingDirectory(install.Path());
     const wxArrayString print = ModuleInfoLines(1025), verify = ModuleInfoLines(1030);
-    ASSERT_EQ(print.size(), 7u);
-    ASSERT_EQ(verify.size(), 7u);
+    ASSERT_TRUE(print.size() == 7 && verify.size() == 7);
     EXPECT_EQ(print[2] + "|" + print[3], "Quenta Print Studio|Version 3.0.21.07");
     EXPECT_EQ(verify[2] + "|" + verify[3], "Zel Verify Studio|Version N/A") << "not installed";
     EXPECT_TRUE(ModuleInfoLines(1024).empty());

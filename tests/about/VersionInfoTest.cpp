@@ -8,7 +8,6 @@
 
 namespace {
 
-const std::string kDir = VELTRONA_VERSION_FILES "/";
 const std::string kNotFound = "VersionInfo: can not find the file.";
 
 // The formatted product version, or the message of the error thrown.
@@ -31,6 +30,6 @@ TEST(VersionInfo, ReadsTheProductVersionNotTheFileVersion)
         {"pe-no-version", kNotFound}, {"elf-no-version", kNotFound}, {"missing", kNotFound},
     };
     for (const auto& [file, expected] : cases)
-        EXPECT_EQ(Read(kDir + file), expected) << file;
+        EXPECT_EQ(Read(VELTRONA_VERSION_FILES "/" + std::string(file)), expected) << file;
     EXPECT_EQ(GetLauncherVersion(), "3.1.2.01");
 }

@@ -70,9 +70,8 @@ TEST_F(LaunchModuleTest, FilesReachInspectAndMissingModulesStartNothing)
 TEST(ModuleLanguage, VerifyGetsTheWindowsNumberOfTheUsersLanguage)
 {
     const std::pair<const char*, int> cases[] = {
-        {"it_CH", 1040}, {"ja", 1041},    {"de_XX", 1031}, {"nl_BE", 1043}, {"fr_CA", 1036},
-        {"es_MX", 1034}, {"en_GB", 2057}, {"en_US", 1033}, {"pt_BR", 1046}, {"pt_PT", 1033},
-        {"ko_KR", 1033}, {"zh_CN", 2052}, {"zh_TW", 1033}, {"C", 1033},
+        {"it_CH", 1040}, {"ja", 1041},    {"de_XX", 1031}, {"fr_CA", 1036}, {"en_GB", 2057},
+        {"pt_BR", 1046}, {"pt_PT", 1033}, {"zh_CN", 2052}, {"zh_TW", 1033}, {"C", 1033},
     };
     for (const char* name : {"LANGUAGE", "LC_ALL", "LC_MESSAGES"})
         unsetenv(name);

@@ -1,5 +1,4 @@
-// Catalogue resources: which of them start-up copies, that each translates every
-// text of the sources, and the frame's menus in another language.
+// Catalogue resources: which start-up copies, their completeness, the menus they translate.
 #include "app/UserLanguage.h"
 #include "frame/Veltro3AppFrame.h"
 #include "platform/ResourceImage.h"

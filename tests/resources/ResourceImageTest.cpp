@@ -24,7 +24,6 @@ TEST(ResourceImage, DamagedFilesAndImagesYieldOnlyWholeEntries)
         const Bytes cut(section.begin(), section.begin() + long(length));
         EXPECT_LT(ResourceImage(cut).Entries().size(), whole.Entries().size()) << length;
     }
-
     EXPECT_FALSE(read(exe.size(), ".rsrc2") || read(exe.size(), ".rsr"));
     EXPECT_FALSE(read(4096, ".rsrc")); // cut before the section headers
 }
