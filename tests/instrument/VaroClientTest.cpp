@@ -45,8 +45,7 @@ struct Recorder : wxEventFilter
     Events events; // unordered: each notification has a worker of its own
 };
 
-// Lets every notification reach the clients, destroys them (which waits for
-// their workers) and delivers what the workers posted.
+// Lets notifications arrive, destroys the clients with their workers, delivers what they posted.
 template <typename Clients> void Finish(Clients& clients)
 {
     EXPECT_EQ(SIM(varosim_wait_idle)(10000), 0);
