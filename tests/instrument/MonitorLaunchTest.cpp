@@ -1,6 +1,5 @@
 // The Monitor module's instrument check: a message instead of the module while
-// the instrument answers from its measuring table; otherwise, and without a
-// usable instrument library, the module starts.
+// the instrument is on its measuring table; otherwise the module starts.
 #include "frame/Veltro3AppFrame.h"
 #include "frame/Veltro3MainAppStandardView.h"
 #include "instrument/SimControl.h"
@@ -21,25 +20,20 @@ namespace {
 // A launcher frame in an installation of the Monitor stand-in, which logs its starts.
 struct Launcher
 {
-    Launcher() : install({"Monitor/Zel Display Studio.exe"}), log(install.Path() + "/starts.log")
+    Launcher()
     {
         setenv("VELTRONA_STANDIN_LOG", log.c_str(), 1);
         setenv("VELTRONA_STANDIN_EXIT", "1", 1);
         wxSetWorkingDirectory(install.Path());
         frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
     }
-    ~Launcher()
-    {
-        frame->Destroy();
-        wxSetWorkingDirectory("/");
-    }
-
+    ~Launcher() { frame->Destroy(), wxSetWorkingDirectory("/"); }
     void Launch() { frame->GetStandardView()->LaunchModule(1002, wxString()); }
     size_t Starts() const { return SettledRecords(log).size(); }
 
     DialogRecorder dialogs;
-    StandinDir install;
-    std::string log;
+    StandinDir install{{"Monitor/Zel Display Studio.exe"}};
+    std::string log = install.Path() + "/starts.log";
     Veltro3AppFrame* frame;
 };
 
@@ -78,8 +72,7 @@ TEST(MonitorLaunch, DISABLED_ChildStartsTheModule)
     EXPECT_EQ(VaroLibrary::Get().IsLoaded(), std::getenv("VARO_EXPECT_LIBRARY") != nullptr);
 }
 
-// No library beside the launcher, then one that lacks its measure function and
-// whose instrument would answer from the table.
+// No library beside the launcher, then one lacking its measure function.
 TEST(MonitorLaunch, StartsWithoutAUsableLibrary)
 {
     const StandinDir dir({});
