@@ -71,6 +71,8 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapPressed()); }));
     sim.MouseMove(view->GetScreenPosition() + wxPoint(5, 100));
     sim.MouseUp();
+    // The release is handled (the capture gone) before the pointer comes back.
+    EXPECT_TRUE(WaitFor([&] { return !printer->HasCapture(); }));
     EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
 
     // A real click on each button starts its module with its arguments, as its
@@ -103,8 +105,6 @@ TEST(LauncherViewTest, LooksAndStartsModules)
         EXPECT_EQ(target->GetRect(), wxRect(b.at, b.exe ? wxSize(152, 58) : wxSize(28, 30)));
         EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
         pointAt(target);
-        // Clicked only once the button has seen the pointer arrive.
-        ASSERT_TRUE(WaitFor([&] { return target->GetState() == 1; })) << b.id;
         sim.MouseClick();
         if (!b.exe)
             continue;
