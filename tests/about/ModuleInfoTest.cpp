@@ -1,14 +1,18 @@
 // The About Modules lines and the module window on the real display.
 #include "about/ModuleInfo.h"
 #include "about/ModuleSplash.h"
+#include "platform/ScreenCapture.h"
 #include "support/GuiWait.h"
 #include "support/StandinDir.h"
 
 #include <gtest/gtest.h>
+#include <gtk/gtk.h>
 
 #include <wx/filefn.h>
 #include <wx/uiaction.h>
 #include <wx/weakref.h>
+
+#include <algorithm>
 
 TEST(ModuleInfo, LinesShowTheProductVersionOrNA)
 {
@@ -23,16 +27,36 @@ TEST(ModuleInfo, LinesShowTheProductVersionOrNA)
     EXPECT_TRUE(ModuleInfoLines(1024).empty());
 }
 
-TEST(ModuleInfo, WindowIsCentredAndClosesAtTheFirstPressAnywhereOrKey)
+namespace {
+
+// The darkest green level of the name line (y 20 to 32) once the light paper beside it shows.
+int DarkestOfName(const wxRect& area)
 {
+    const wxImage shot = CaptureScreen(area);
+    int darkest = 255;
+    for (int x = 140; shot.IsOk() && shot.GetGreen(420, 50) > 200 && x < 400; ++x)
+        for (int y = 20; y < 32; ++y)
+            darkest = std::min(darkest, int(shot.GetGreen(x, y)));
+    return darkest;
+}
+
+} // namespace
+
+TEST(ModuleInfo, WindowIsCentredReadableInADarkThemeAndClosesAtTheFirstPressAnywhereOrKey)
+{
+    // GTK reads GTK_THEME again whenever the theme changes.
+    setenv("GTK_THEME", "Adwaita:dark", 1);
+    g_object_set(gtk_settings_get_default(), "gtk-theme-name", "Adwaita", nullptr);
     wxUIActionSimulator input;
     for (const std::string action : {"press on it", "press elsewhere", "key"}) {
         // The user opens the window from the menu: the window manager sees input first.
         input.MouseClick();
         const wxWeakRef<ZelModuleSplashScreen> window(
-            new ZelModuleSplashScreen(-1, wxArrayString(1, wxString("Quenta Print Studio"))));
+            new ZelModuleSplashScreen(-1, ModuleInfoLines(1025)));
         const wxRect area = window->GetScreenRect();
         EXPECT_EQ(area, wxRect(420, 462, 440, 100)) << action;
+        ASSERT_GT(window->GetForegroundColour().GetLuminance(), 0.5) << "the theme's text is light";
+        EXPECT_TRUE(WaitFor([&] { return DarkestOfName(area) < 80; }, 3000)) << action;
         EXPECT_TRUE(window->HasCapture()) << action;
         ASSERT_TRUE(WaitFor([&] { return window->IsActive(); })) << action;
         if (action == "key") {

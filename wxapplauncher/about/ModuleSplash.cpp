@@ -30,9 +30,9 @@ wxBEGIN_EVENT_TABLE(ZelModuleSplashScreen, wxDialog)
     EVT_CHAR(ZelModuleSplashScreen::OnKeyOrFocusLoss)
     EVT_PAINT(ZelModuleSplashScreen::OnPaint)
 wxEND_EVENT_TABLE()
-    // clang-format on
+// clang-format on
 
-    wxBitmap LoadCommonBitmap(const wxString& name)
+wxBitmap LoadCommonBitmap(const wxString& name)
 {
     EnsureCommonImages();
     return wxXmlResource::Get()->LoadBitmap(name);
@@ -113,6 +113,7 @@ void ZelModuleSplashScreen::OnPaint(wxPaintEvent&)
     wxPaintDC dc(this);
     if (m_picture.IsOk())
         dc.DrawBitmap(m_picture, 0, 0, true);
+    dc.SetTextForeground(DarkOnPicture(dc.GetTextForeground()));
     dc.SetFont(GetUIFont(kPointSize, wxFONTWEIGHT_BOLD));
     for (size_t i = 0; i < m_lines.size(); ++i) {
         if (i == kBoldLines)

@@ -235,3 +235,9 @@ wxFont GetUIFont(int pointSize, int weight)
                       .Encoding(wxFONTENCODING_DEFAULT)
                       .Weight(numericWeight));
 }
+
+wxColour DarkOnPicture(const wxColour& colour)
+{
+    const double luminance = 0.30 * colour.Red() + 0.59 * colour.Green() + 0.11 * colour.Blue();
+    return luminance < 127.5 ? colour : *wxBLACK;
+}

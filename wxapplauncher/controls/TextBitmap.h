@@ -1,6 +1,6 @@
 // Text rendered once into bitmaps of one colour whose alpha carries the glyph
 // coverage, alpha compositing of such bitmaps over pictures, and the
-// launcher's font.
+// launcher's font and its text colour on pictures.
 #pragma once
 
 #include <wx/arrstr.h>
@@ -34,3 +34,7 @@ wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay,
 // Tahoma of the given size and weight (wxNORMAL, wxBOLD or a wxFontWeight);
 // -1 for either gives 12-point regular.
 wxFont GetUIFont(int pointSize, int weight);
+
+// The text colour on the launcher's light pictures: the given colour, unless
+// a dark desktop theme made it light.
+wxColour DarkOnPicture(const wxColour& colour);

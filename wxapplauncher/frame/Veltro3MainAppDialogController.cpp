@@ -27,12 +27,6 @@ bool IsUsablePicture(const wxBitmap& bitmap)
     return bitmap.IsOk() && bitmap.GetWidth() > 0 && bitmap.GetHeight() > 0;
 }
 
-wxColour DarkOnPicture(const wxColour& colour)
-{
-    const double luminance = 0.30 * colour.Red() + 0.59 * colour.Green() + 0.11 * colour.Blue();
-    return luminance < 127.5 ? colour : *wxBLACK;
-}
-
 Veltro3MainAppDialogController::Veltro3MainAppDialogController(wxWindow* parent, wxWindowID id,
                                                                const wxPoint& pos,
                                                                const wxSize& size, long style,

@@ -41,7 +41,3 @@ private:
 
 // A picture that can be drawn: loaded, and not empty.
 bool IsUsablePicture(const wxBitmap& bitmap);
-
-// The text colour on the launcher's light pictures: the given colour, unless
-// a dark desktop theme made it light.
-wxColour DarkOnPicture(const wxColour& colour);
