@@ -36,10 +36,10 @@ TEST(FrameTest, MenusFixedSizeAndExitWithoutAsking)
               "&File|1001 Create &Printer Profile...|1002 Create &Monitor Profile..."
               "|1003 Create &Device Link Profile...|-|1005 &Inspect Profile..."
               "|1006 &Edit Profile...|1004 &Verify Color...|-|1007 E&xit\n"
-              "&Help|1015 Veltrona &Help\tF1|1016 User Guide|1017 User Forum|1107 How-To|-"
+              "&Help|1015 Veltrona &Help\tF1|1016 User &Guide|1017 User &Forum|1107 H&ow-To|-"
               "|1019 &About Veltrona|1023 About &Modules[|1025 Quenta Print Studio"
               "|1026 Zel Display Studio|1027 Quenta Link Studio|1028 Quenta Inspect Studio"
-              "|1029 Quenta Edit Studio|1030 Zel Verify Studio]|-|1020 Check for Updates...\n");
+              "|1029 Quenta Edit Studio|1030 Zel Verify Studio]|-|1020 Check for &Updates...\n");
 
     frame->Show();
     const wxSize size = frame->GetSize();

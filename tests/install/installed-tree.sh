@@ -25,6 +25,7 @@ for file in applications/veltrona.desktop metainfo/veltrona.metainfo.xml man/man
 done
 [ "$(readlink "$root/bin/veltrona")" = ../lib/veltrona/Veltrona.exe ] || fail "bin/veltrona"
 desktop-file-validate "$root/share/applications/veltrona.desktop"
+! grep -q '&' "$root/share/applications/veltrona.desktop" || fail "a menu mnemonic in veltrona.desktop"
 appstreamcli validate --no-net "$root/share/metainfo/veltrona.metainfo.xml" >/dev/null
 
 # xdg-mime splits XDG_DATA_DIRS at blanks too, so the desktop sees share/ through a link.

@@ -15,6 +15,7 @@
 #include <cstdio>
 #include <fstream>
 #include <memory>
+#include <set>
 
 using Bytes = std::vector<unsigned char>;
 
@@ -26,19 +27,19 @@ Bytes Catalogue(const std::string& name)
     return entry ? Bytes(entry->data, entry->data + entry->size) : Bytes();
 }
 
-// The labels of a new frame's menus and of their items, in order.
-std::vector<std::string> MenuLabels()
+// Per menu of a new frame, its label and those of its items, in order.
+std::vector<std::vector<std::string>> MenuLabels()
 {
     Veltro3AppFrame* frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
     const wxMenuBar* bar = frame->GetMenuBar();
-    std::vector<std::string> labels;
-    for (size_t i = 0; i < bar->GetMenuCount(); ++i) {
-        labels.push_back(bar->GetMenuLabel(i).utf8_string());
+    std::vector<std::vector<std::string>> menus(bar->GetMenuCount());
+    for (size_t i = 0; i < menus.size(); ++i) {
+        menus[i].push_back(bar->GetMenuLabel(i).utf8_string());
         for (const wxMenuItem* item : bar->GetMenu(i)->GetMenuItems())
-            labels.push_back(item->GetItemLabel().utf8_string());
+            menus[i].push_back(item->GetItemLabel().utf8_string());
     }
     frame->Destroy();
-    return labels;
+    return menus;
 }
 
 // The language, and whether a catalogue translates it.
@@ -82,9 +83,9 @@ TEST(Catalogs, EveryCatalogueTranslatesEveryTextOfTheSources)
     std::remove(mo.c_str());
 }
 
-TEST_P(MenusInLanguage, FileAndHelpMenusAreTranslated)
+TEST_P(MenusInLanguage, FileAndHelpMenusAreTranslatedWithALetterPerItem)
 {
-    const std::vector<std::string> english = MenuLabels();
+    const auto english = MenuLabels();
     for (const char* name : {"LANGUAGE", "LC_ALL", "LC_MESSAGES"})
         unsetenv(name);
     setenv("LANG", (GetParam().first + ".UTF-8").c_str(), 1);
@@ -96,19 +97,33 @@ TEST_P(MenusInLanguage, FileAndHelpMenusAreTranslated)
     wxLocale::AddCatalogLookupPathPrefix("memory:.");
     locale.AddCatalog("Veltro");
 
-    const std::vector<std::string> shown = MenuLabels();
+    const auto shown = MenuLabels();
     ASSERT_EQ(shown.size(), english.size());
     size_t translated = 0;
-    for (size_t i = 0; i < english.size(); ++i)
-        translated += shown[i] != english[i];
+    for (size_t m = 0; m < shown.size(); ++m) {
+        ASSERT_EQ(shown[m].size(), english[m].size());
+        std::set<wxString> letters;
+        size_t items = 0;
+        for (size_t i = 0; i < shown[m].size(); ++i) {
+            translated += shown[m][i] != english[m][i];
+            const wxString label = wxString::FromUTF8(shown[m][i]).BeforeFirst('\t');
+            items += i > 0 && !label.empty();
+            if (i > 0 && label.Freq('&') == 1)
+                letters.insert(label.AfterFirst('&').Left(1).Lower());
+        }
+        EXPECT_EQ(letters.size(), items) << "a missing or shared mnemonic in " << shown[m][0];
+    }
     if (GetParam().second)
         EXPECT_GE(translated, 13u);
     else
         EXPECT_EQ(shown, english);
 }
 
-// ja_JP uses a two-letter catalogue; de_XX is installed nowhere; ko_KR has none.
+// Every catalogue; ja_JP uses a two-letter one; de_XX is installed nowhere; ko_KR has none.
 INSTANTIATE_TEST_SUITE_P(Languages, MenusInLanguage,
                          testing::Values(std::pair("ja_JP", true), std::pair("zh_CN", true),
-                                         std::pair("de_XX", true), std::pair("ko_KR", false)),
+                                         std::pair("de_XX", true), std::pair("ko_KR", false),
+                                         std::pair("en_GB", false), std::pair("es_ES", true),
+                                         std::pair("fr_FR", true), std::pair("it_IT", true),
+                                         std::pair("nl_NL", true), std::pair("pt_BR", true)),
                          [](const auto& info) { return info.param.first; });

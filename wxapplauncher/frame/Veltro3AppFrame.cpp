@@ -92,14 +92,14 @@ void Veltro3AppFrame::BuildMenuBar()
 
     wxMenu* help = new wxMenu;
     help->Append(ID_HELP, _("Veltrona &Help\tF1"), wxString());
-    help->Append(ID_USER_GUIDE, _("User Guide"), wxString());
-    help->Append(ID_USER_FORUM, _("User Forum"), wxString());
-    help->Append(ID_HOW_TO, _("How-To"), wxString());
+    help->Append(ID_USER_GUIDE, _("User &Guide"), wxString());
+    help->Append(ID_USER_FORUM, _("User &Forum"), wxString());
+    help->Append(ID_HOW_TO, _("H&ow-To"), wxString());
     help->AppendSeparator();
     help->Append(ID_ABOUT, _("&About Veltrona"), wxString());
     help->Append(ID_ABOUT_MODULES, _("About &Modules"), modules, wxString());
     help->AppendSeparator();
-    help->Append(ID_CHECK_UPDATES, _("Check for Updates..."), wxString());
+    help->Append(ID_CHECK_UPDATES, _("Check for &Updates..."), wxString());
 
     wxMenuBar* menuBar = new wxMenuBar;
     menuBar->Append(file, _("&File"));
