@@ -1,5 +1,6 @@
 // One copy of the launcher per user: of copies started together exactly one
-// runs, and a copy killed outright never keeps the next one from starting.
+// runs, a copy killed outright never keeps the next one from starting, and
+// without XDG_RUNTIME_DIR no other user can switch the lock off.
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
@@ -7,7 +8,12 @@
 #include <gtest/gtest.h>
 
 #include <csignal>
+#include <filesystem>
 #include <memory>
+#include <sched.h>
+#include <sys/mount.h>
+#include <sys/stat.h>
+#include <unistd.h>
 
 namespace {
 
@@ -46,6 +52,31 @@ TEST(InstanceLockTest, TenCopiesAtOnceGiveOneAndAKilledCopyBlocksNone)
         running[0]->Kill(SIGKILL);
         int status = 0;
         ASSERT_TRUE(running[0]->WaitForExit(10000, status));
+    }
+}
+
+TEST(InstanceLockTest, WithoutARuntimeDirATakenTmpFolderStillGivesOneCopy)
+{
+    // A /tmp of this test's own, so that the taken folder troubles nobody else.
+    if (unshare(CLONE_NEWNS) != 0)
+        GTEST_SKIP() << "needs root";
+    ASSERT_EQ(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr), 0);
+    ASSERT_EQ(mount("tmpfs", "/tmp", "tmpfs", 0, "mode=1777"), 0);
+    StandinDir install({});
+    const EnvList env = {{"XDG_RUNTIME_DIR", ""}, {"XDG_CACHE_HOME", install.Path() + "/cache"}};
+    const std::string taken = "/tmp/veltrona-" + std::to_string(getuid());
+    // Made first by another user, or open to others.
+    for (const mode_t mode : {0700, 0755}) {
+        ASSERT_EQ(mkdir(taken.c_str(), mode), 0);
+        std::filesystem::permissions(taken, std::filesystem::perms(mode));
+        ASSERT_EQ(chown(taken.c_str(), mode == 0700 ? 65534 : getuid(), -1), 0);
+        ProbeRun first(install.Path(), {}, env);
+        ASSERT_TRUE(first.WaitForShown());
+        ProbeRun second(install.Path(), {}, env);
+        int status = 0;
+        ASSERT_TRUE(second.WaitForExit(10000, status));
+        EXPECT_TRUE(second.Events("shown").empty());
+        rmdir(taken.c_str());
     }
 }
 

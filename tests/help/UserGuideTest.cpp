@@ -131,6 +131,11 @@ TEST(UserGuideTest, ReaderLinkOpensItsAddressOrSaysWhyNot)
     dialog.Show();
     // Placed by the window manager and ready for the pointer once active.
     ASSERT_TRUE(WaitFor([&] { return dialog.IsActive(); }));
+    // The title and the hint line are as high as their text in the real font.
+    for (const wxWindowID id : {200, 210}) {
+        const wxWindow* text = dialog.FindWindow(id);
+        EXPECT_LE(text->GetTextExtent(text->GetLabel()).y, text->GetSize().y) << id;
+    }
     wxUIActionSimulator pointer;
     pointer.MouseMove(dialog.m_link->GetScreenRect().GetLeftTop() + wxPoint(4, 4));
     pointer.MouseClick();

@@ -1,5 +1,6 @@
 // The updater's schedule and "Silent" mark (its stand-in records the "Silent" it
 // finds), the start from the Help menu, the clean-up of its temporary files.
+#include "settings/CProfileConfig.h"
 #include "settings/UpdateCheck.h"
 #include "support/ProbeRun.h"
 #include "support/ScopedEnv.h"
@@ -35,6 +36,12 @@ void Write(const std::string& path, const std::string& text)
 TEST(UpdaterTest, ScheduleAndSilentMark)
 {
     using Value = std::optional<std::string>;
+    enum class Kind
+    {
+        File,
+        Link,
+        ReadOnly
+    };
     const std::string kept = "Silent=0\n# kept\n[Other]\nkey=value\n";
     // Files given as "" are not there; userAfter "" means unchanged.
     const struct
@@ -43,16 +50,23 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
         bool starts;
         Value atLaunch, fromMenu;
         std::string userAfter;
+        Kind kind = Kind::File;
     } cases[] = {
         {"", "", true, {}, {}, ""},
         {"Next\\ Launch=Never\n", "", false, {}, {}, ""},
         {NextLaunch(1), "", false, {}, {}, ""},
         {NextLaunch(1, "x"), "", true, {}, {}, ""},
+        {NextLaunch(1, " 12:00"), "", false, {}, {}, ""},
+        {NextLaunch(1, "T00:00:00"), "", false, {}, {}, ""},
+        {NextLaunch(0, " 23:59"), "", true, {}, {}, ""},
         {"", NextLaunch(1), false, {}, {}, ""},
         {kept, "", true, "1", "0", kept},
         {"", "Silent=0\n", true, "1", "0", "Silent=0\n"},
         {"Silent=abc\n", "", true, "abc", "abc", ""},
-        {"Name=\xe9t\xe9\n", "Silent=0\n", true, "0", "0", ""}, // not UTF-8: left alone
+        // Not UTF-8, read-only, a link: written only through the link.
+        {"Silent=0\nName=\xe9t\xe9\n", "", false, {}, "0", ""},
+        {"Silent=1\n", "", false, {}, "1", "", Kind::ReadOnly},
+        {"Silent=5\n", "", true, "1", "0", "Silent=0\n", Kind::Link},
     };
     for (const auto& test : cases) {
         SCOPED_TRACE(test.user + "|" + test.system);
@@ -63,8 +77,15 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
                        {"XDG_CONFIG_DIRS", root + "/etc"},
                        {"VELTRONA_STANDIN_LOG", log},
                        {"VELTRONA_STANDIN_EXIT", "1"}});
-        if (!test.user.empty())
+        if (test.kind == Kind::Link) {
+            Write(root + "/target", test.user);
+            fs::create_directories(fs::path(user).parent_path());
+            fs::create_symlink(root + "/target", user);
+        } else if (!test.user.empty()) {
             Write(user, test.user);
+        }
+        if (test.kind == Kind::ReadOnly)
+            fs::permissions(user, fs::perms(0444));
         if (!test.system.empty())
             Write(root + "/etc" + kSettings, test.system);
         const wxString oldDir = wxGetCwd();
@@ -73,6 +94,8 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
         const auto atLaunch = SettledRecords(log);
         CheckForUpdatesNow();
         const auto all = SettledRecords(log);
+        // The launcher reads what the updater reads.
+        const wxString silent = CProfileConfig("Zel Updater").ReadString("Silent", "none");
         wxSetWorkingDirectory(oldDir);
 
         ASSERT_EQ(atLaunch.size(), test.starts ? 1u : 0u);
@@ -82,6 +105,8 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
             EXPECT_EQ(atLaunch[0].silent, test.atLaunch);
         }
         EXPECT_EQ(all.back().silent, test.fromMenu);
+        EXPECT_EQ(silent.ToStdString(), test.fromMenu.value_or("none"));
+        EXPECT_EQ(fs::is_symlink(user), test.kind == Kind::Link);
         std::ifstream after(user, std::ios::binary);
         EXPECT_EQ(std::string(std::istreambuf_iterator<char>(after), {}),
                   test.userAfter.empty() ? test.user : test.userAfter);
@@ -93,8 +118,10 @@ TEST(UpdaterTest, StartUpRemovesLeftoversAndStartsADueUpdate)
     StandinDir install({kUpdater});
     const std::string root = install.Path(), tmp = root + "/tmp", log = root + "/starts.log";
     fs::create_directories(tmp + "/ZELUPDATE_dir");
-    for (const char* name : {"/ZELUPDATE_abc", "/other.txt", "/xZELUPDATE_abc"})
+    for (const char* name : {"/ZELUPDATE_abc", "/ZELUPDATE_open", "/other.txt", "/xZELUPDATE_abc"})
         Write(tmp + name, "x");
+    // Held open by this process, as by a running updater.
+    const std::ifstream held(tmp + "/ZELUPDATE_open");
     Write(root + "/target", "x");
     fs::create_symlink(root + "/target", tmp + "/ZELUPDATE_link");
     Write(root + "/config" + kSettings, "Silent=0\n");
@@ -110,6 +137,7 @@ TEST(UpdaterTest, StartUpRemovesLeftoversAndStartsADueUpdate)
     ASSERT_EQ(records.size(), 1u);
     EXPECT_EQ(records[0].silent, "1");
     EXPECT_FALSE(fs::exists(tmp + "/ZELUPDATE_abc"));
+    EXPECT_TRUE(fs::exists(tmp + "/ZELUPDATE_open"));
     EXPECT_TRUE(fs::is_directory(tmp + "/ZELUPDATE_dir"));
     EXPECT_TRUE(fs::is_symlink(tmp + "/ZELUPDATE_link") && fs::exists(root + "/target"));
     EXPECT_TRUE(fs::exists(tmp + "/other.txt") && fs::exists(tmp + "/xZELUPDATE_abc"));

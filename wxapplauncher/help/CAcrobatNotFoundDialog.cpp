@@ -39,17 +39,18 @@ CAcrobatNotFoundDialog::CAcrobatNotFoundDialog(wxWindow* parent)
                    wxDefaultPosition, wxDefaultSize, wxNO_BORDER, "zelStaticBitmap"),
                0, wxALIGN_CENTER_VERTICAL | wxALL, 5);
     title->Add(10, 15, 0, wxALIGN_CENTER_VERTICAL | wxALL, 5);
+    // The title and the hint line are as high as the font needs: 15 and 12
+    // pixels cut them in the desktop's font.
     title->Add(new wxStaticText(this, kTitleId, _("Acrobat Reader not found"), wxDefaultPosition,
-                                wxSize(-1, 15), wxALIGN_CENTRE),
+                                wxDefaultSize, wxALIGN_CENTRE),
                0, wxALIGN_CENTER_VERTICAL);
     title->Add(50, 15, 0, wxALIGN_CENTER_VERTICAL);
     main->Add(title, 0, wxALIGN_CENTER_HORIZONTAL | wxALL, 5);
 
     auto* hint = new wxBoxSizer(wxHORIZONTAL);
     hint->Add(20, 15, 0, wxALIGN_CENTER_VERTICAL);
-    hint->Add(new wxStaticText(this, kHintId, _("Please install a free version from:"),
-                               wxDefaultPosition, wxSize(-1, 12)),
-              0, wxALIGN_CENTER_VERTICAL);
+    hint->Add(new wxStaticText(this, kHintId, _("Please install a free version from:")), 0,
+              wxALIGN_CENTER_VERTICAL);
     main->Add(hint, 0, wxALIGN_CENTER_HORIZONTAL);
 
     m_link = new ZelLinkText(this, kLinkId, kReaderDownloadPage, wxEmptyString, wxDefaultPosition,

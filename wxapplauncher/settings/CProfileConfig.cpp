@@ -1,13 +1,16 @@
 #include "settings/CProfileConfig.h"
 
-#include <wx/ffile.h>
+#include <wx/file.h>
 #include <wx/fileconf.h>
 #include <wx/filename.h>
 #include <wx/tokenzr.h>
 #include <wx/utils.h>
 
 #include <cerrno>
+#include <cstdlib>
+#include <cstring>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace {
 
@@ -35,44 +38,77 @@ wxString SettingsFile(const wxString& dir, const wxString& appName)
 enum class FileState
 {
     Missing,
-    Readable,
+    Writable,
+    ReadOnly,
+    Lossy,
     Unusable
 };
 
+// Bytes that are not UTF-8 come through as private-use characters, so that one
+// stray byte does not hide the rest of the file.
+const wxMBConvUTF8 kLenientUtf8(wxMBConvUTF8::MAP_INVALID_UTF8_TO_PUA);
+
+// The toolkit writes by renaming a new file over the old one, which would turn
+// a link into a file of its own: the file a link leads to is the one to write.
+// Empty for a link that leads nowhere.
+wxString FollowLinks(const wxString& path)
+{
+    struct stat info;
+    if (lstat(path.fn_str(), &info) != 0 || !S_ISLNK(info.st_mode))
+        return path;
+    char* target = realpath(path.fn_str(), nullptr);
+    const wxString resolved = target ? wxString(target, *wxConvFileName) : wxString();
+    free(target);
+    return resolved;
+}
+
 // Unusable: not a regular file (a FIFO would block, a device never end), too
-// big, unreadable, or not UTF-8 text. The toolkit would read such a file as
-// empty and then overwrite it with the one value written.
+// big or unreadable. Lossy: not UTF-8 text that would be written back byte for
+// byte. ReadOnly: without write permission (also for root, whom the system
+// would let write it), or in a folder where no new file can replace it.
 FileState CheckFile(const wxString& path)
 {
     struct stat info;
-    if (stat(path.fn_str(), &info) != 0)
-        return errno == ENOENT ? FileState::Missing : FileState::Unusable;
+    if (path.empty() || stat(path.fn_str(), &info) != 0)
+        return !path.empty() && errno == ENOENT ? FileState::Missing : FileState::Unusable;
     if (!S_ISREG(info.st_mode) || info.st_size > kMaxFileSize)
         return FileState::Unusable;
-    wxFFile file(path, "rb");
-    wxString text;
-    if (!file.IsOpened() || !file.ReadAll(&text, wxConvUTF8))
+    wxFile file(path);
+    wxCharBuffer bytes(info.st_size);
+    if (!file.IsOpened() || file.Read(bytes.data(), info.st_size) != info.st_size)
         return FileState::Unusable;
-    return text.empty() && info.st_size > 0 ? FileState::Unusable : FileState::Readable;
+    size_t wideLength = 0, length = 0;
+    const wxWCharBuffer text = kLenientUtf8.cMB2WC(bytes, bytes.length(), &wideLength);
+    const wxCharBuffer back = kLenientUtf8.cWC2MB(text, wideLength, &length);
+    if (info.st_size > 0 &&
+        (wxConvUTF8.ToWChar(nullptr, 0, bytes, bytes.length()) == wxCONV_FAILED ||
+         length != bytes.length() || std::memcmp(back, bytes, length) != 0))
+        return FileState::Lossy;
+    const wxString dir = wxFileName(path).GetPath();
+    return (info.st_mode & 0222) && access(path.fn_str(), W_OK) == 0 &&
+                   access(dir.fn_str(), W_OK) == 0
+               ? FileState::Writable
+               : FileState::ReadOnly;
 }
 
 } // namespace
 
 CProfileConfig::CProfileConfig(const wxString& appName) : m_config(nullptr), m_writable(false)
 {
-    const wxString userFile = UserFile(appName);
+    const wxString userFile = FollowLinks(UserFile(appName));
     const wxString systemFile = SystemFile(appName);
     const FileState user = CheckFile(userFile);
-    m_writable = user != FileState::Unusable;
+    const FileState system = CheckFile(systemFile);
+    m_writable = user == FileState::Missing || user == FileState::Writable;
 
     long style = 0;
-    if (m_writable)
+    if (user != FileState::Unusable)
         style |= wxCONFIG_USE_LOCAL_FILE;
-    if (CheckFile(systemFile) == FileState::Readable)
+    if (system != FileState::Missing && system != FileState::Unusable)
         style |= wxCONFIG_USE_GLOBAL_FILE;
-    m_config = new wxFileConfig(appName, kVendor, m_writable ? userFile : wxString(),
-                                (style & wxCONFIG_USE_GLOBAL_FILE) ? systemFile : wxString(), style,
-                                wxConvUTF8);
+    m_config = new wxFileConfig(
+        appName, kVendor, (style & wxCONFIG_USE_LOCAL_FILE) ? userFile : wxString(),
+        (style & wxCONFIG_USE_GLOBAL_FILE) ? systemFile : wxString(), style, kLenientUtf8);
     // Values are taken as stored, "$HOME" included.
     m_config->SetExpandEnvVars(false);
 }

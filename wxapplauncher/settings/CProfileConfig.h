@@ -18,9 +18,13 @@ public:
     wxString ReadString(const wxString& key, const wxString& defaultValue) const;
     // The stored integer, or `defaultValue` when it is missing or not an integer.
     long ReadLong(const wxString& key, long defaultValue) const;
-    // Stores the value in the user's file at once. Does nothing when that file
-    // exists but could not be read whole, so that nothing in it is lost.
+    // Stores the value in the user's file at once (through a link, in the file
+    // it leads to). Does nothing unless IsWritable().
     void WriteLong(const wxString& key, long value);
+    // True when the user's file is missing, or is UTF-8 text that was read whole
+    // and may be replaced without losing a byte. A file that is read-only, not
+    // UTF-8 or unreadable is read as far as it can be and never written.
+    bool IsWritable() const { return m_writable; }
 
     // "<config home>/Zelgrave/<appName>.conf": $XDG_CONFIG_HOME when it is an
     // absolute path, else ~/.config.
