@@ -11,8 +11,7 @@ public:
     wxConnectionBase* OnAcceptConnection(const wxString& topic) override;
 };
 
-// Receives into the toolkit's growing buffer, so a path of any length arrives whole.
-class Veltro3AppLauncherIPCConnection : public wxTCPConnection
+class Veltro3AppLauncherIPCConnection : public IpcConnection
 {
 public:
     // "Raise" brings the main frame up (restoring it when minimised) once it is
