@@ -147,8 +147,8 @@ int Veltro3App::OnExit()
 
 void Veltro3App::OnIdle(wxIdleEvent& event)
 {
-    if (m_initialised && m_deferredStartupPending &&
-        m_frame) // not while the splash yields in OnInit
+    // Not while the splash yields in OnInit, before the frame is made.
+    if (m_initialised && m_deferredStartupPending && m_frame)
         RunDeferredStartup();
     event.Skip();
 }
