@@ -25,8 +25,8 @@ namespace {
 
 using Args = std::vector<std::string>;
 
-// A socket connected to `path` (listening there when `listen` is set), that
-// has sent `bytes`.
+// A socket connected to `path` (listening there when `listening`) that has
+// sent `bytes`.
 int OpenSocket(const std::string& path, const std::string& bytes, bool listening = false)
 {
     const int fd = socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
@@ -134,12 +134,13 @@ TEST(RaiseServiceTest, HostilePeersAndASlowViewerNeitherStallTheLauncherNorLoseA
     {
         std::string socket, bytes;
     } peers[] = {
-        {raise, ""},
-        {raise, "\x0a" + Block("IPC", 9)},
-        {raise, "\x0a" + Block("", 0xffffffff)},
+        {raise, ""},                             // silent
+        {raise, "\x0a" + Block("IPC", 9)},       // half a topic
+        {raise, "\x0a" + Block("", 0xffffffff)}, // a 4 GiB topic
+        // a 4 GiB poke after a proper topic
         {raise, connect + "\x03" + Block("Application", 11) + "\x01" + Block("", 0xffffffff)},
-        {sockets + "LaunchPad", ""},
-        {sockets + "LaunchPad", connect + "\x03" + Block("Application", 11)},
+        {sockets + "LaunchPad", ""},                                          // silent
+        {sockets + "LaunchPad", connect + "\x03" + Block("Application", 11)}, // half a poke
     };
     std::vector<int> open;
     Args files;
@@ -153,6 +154,7 @@ TEST(RaiseServiceTest, HostilePeersAndASlowViewerNeitherStallTheLauncherNorLoseA
         EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status;
     }
     std::multiset<Args> opened;
+    // One record more: the viewer's.
     for (const StandinRecord& record : WaitForRecords(log, files.size() + 1))
         if (!record.args.empty())
             opened.insert(record.args);
