@@ -58,20 +58,21 @@ pid_t Start(const std::string& runtime, const std::vector<std::string>& args)
     return pid;
 }
 
-size_t Records()
+bool Opened(const std::string& file)
 {
     std::ifstream in(g_log);
-    size_t count = 0;
     for (std::string line; std::getline(in, line);)
-        count += line == "end";
-    return count;
+        if (line == "arg\t" + file)
+            return true;
+    return false;
 }
 
-// Waits (1 ms steps) until the log holds `count` records; false after 20 s.
-bool WaitForRecords(size_t count)
+// Waits (1 ms steps) until a start record holds `file`; false after 20 s. The
+// file, not a count: the updater's record may come at any time.
+bool WaitForOpened(const std::string& file)
 {
     const auto deadline = Clock::now() + std::chrono::seconds(20);
-    while (Records() < count) {
+    while (!Opened(file)) {
         if (Clock::now() > deadline)
             return false;
         std::this_thread::sleep_for(std::chrono::milliseconds(1));
@@ -124,7 +125,7 @@ int main(int argc, char** argv)
     const pid_t first = Start(runtime, {});
     // The first file is opened once the running copy's frame shows.
     Start(runtime, {"/tmp/warm-up.icc"});
-    if (!WaitForRecords(1)) {
+    if (!WaitForOpened("/tmp/warm-up.icc")) {
         std::fprintf(stderr, "the running copy never opened a file\n");
         return 1;
     }
@@ -138,11 +139,11 @@ int main(int argc, char** argv)
     }
 
     std::vector<double> handover, anchor;
-    size_t records = Records();
     for (int i = 0; i < 20; ++i) {
         auto start = Clock::now();
-        const pid_t second = Start(runtime, {"/tmp/profile-" + std::to_string(i) + ".icc"});
-        if (!WaitForRecords(++records)) {
+        const std::string file = "/tmp/profile-" + std::to_string(i) + ".icc";
+        const pid_t second = Start(runtime, {file});
+        if (!WaitForOpened(file)) {
             std::fprintf(stderr, "hand-over %d never reached Inspect\n", i);
             return 1;
         }

@@ -8,7 +8,7 @@
 
 namespace {
 
-class ViewerConnection : public wxTCPConnection
+class ViewerConnection : public IpcConnection
 {
 public:
     explicit ViewerConnection(const ShowPageFunction& showPage) : m_showPage(showPage) {}

@@ -1,5 +1,5 @@
-// The raise service between two real copies of the launcher, and the rules by
-// which the running copy reads a poke.
+// The raise service between two real copies of the launcher, peers that stall
+// or lie to it, and the rules by which the running copy reads a poke.
 #include "app/Veltro3App.h"
 #include "app/Veltro3AppLauncherIPC.h"
 #include "frame/Veltro3AppFrame.h"
@@ -14,12 +14,47 @@
 #include <wx/utils.h>
 
 #include <csignal>
+#include <cstring>
 #include <filesystem>
+#include <poll.h>
 #include <set>
+#include <sys/socket.h>
+#include <sys/un.h>
 
 namespace {
 
 using Args = std::vector<std::string>;
+
+// A socket connected to `path` (listening there when `listening`) that has
+// sent `bytes`.
+int OpenSocket(const std::string& path, const std::string& bytes, bool listening = false)
+{
+    const int fd = socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
+    sockaddr_un address = {};
+    address.sun_family = AF_UNIX;
+    std::strcpy(address.sun_path, path.c_str());
+    const auto* at = reinterpret_cast<const sockaddr*>(&address);
+    EXPECT_EQ(listening ? bind(fd, at, sizeof address) + listen(fd, 64)
+                        : connect(fd, at, sizeof address),
+              0);
+    send(fd, bytes.data(), bytes.size(), MSG_NOSIGNAL);
+    return fd;
+}
+
+// True once the other end has closed the connection.
+bool EndedByPeer(int fd)
+{
+    char bytes[64];
+    ssize_t got;
+    while ((got = recv(fd, bytes, sizeof bytes, MSG_DONTWAIT)) > 0)
+        ;
+    return got == 0 || errno != EAGAIN;
+}
+
+std::string Block(const std::string& bytes, uint32_t size)
+{
+    return std::string{char(size), char(size >> 8), char(size >> 16), char(size >> 24)} + bytes;
+}
 
 TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
 {
@@ -28,10 +63,11 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
     const EnvList env = {{"XDG_RUNTIME_DIR", install.Path()},
                          {"VELTRONA_STANDIN_LOG", log},
                          {"VELTRONA_STANDIN_EXIT", "1"}};
-    auto handOver = [&](const Args& args) {
+    auto handOver = [&](const Args& args, bool delivered = true) {
         ProbeRun second(install.Path(), args, env, {"", "", profiles.Path()});
         int status = 0;
         EXPECT_TRUE(second.WaitForExit(10000, status));
+        EXPECT_EQ(WIFEXITED(status) && WEXITSTATUS(status) == 0, delivered) << status;
         EXPECT_TRUE(second.Events().empty()) << "a later copy shows nothing";
     };
 
@@ -65,12 +101,80 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
 
     // A frozen first copy keeps no later copy waiting, and gets nothing from it.
     kill(first.Pid(), SIGSTOP);
-    handOver({"frozen.icc"});
+    handOver({"frozen.icc"}, false);
     kill(first.Pid(), SIGCONT);
     CloseWindow(frame);
     int status = 0;
     ASSERT_TRUE(first.WaitForExit(10000, status));
     EXPECT_EQ(SettledRecords(log).size(), expected.size());
+}
+
+// Peers that stall or lie, met while a help request waits for a viewer that
+// takes the connection and never answers: the launcher drops each of them, and
+// a later copy's file reaches Inspect meanwhile.
+TEST(RaiseServiceTest, HostilePeersAndASlowViewerNeitherStallTheLauncherNorLoseAFile)
+{
+    StandinDir install({"Quenta Inspect Studio.exe", "Help/Veltrona Help.exe"}), profiles({});
+    const std::string log = install.Path() + "/starts.log", sockets = install.Path() + "/veltrona/";
+    const EnvList env = {{"XDG_RUNTIME_DIR", install.Path()},
+                         {"VELTRONA_STANDIN_LOG", log},
+                         {"VELTRONA_STANDIN_EXIT", "1"}};
+    const std::string raise = sockets + "Zelgrave.Veltrona." + wxGetUserId().utf8_string() + ".ipc";
+    EnvList withHelp = env;
+    withHelp.push_back({"VELTRONA_PROBE_COMMAND", "1015"});
+    ProbeRun first(install.Path(), {}, withHelp);
+    ASSERT_TRUE(WaitFor([&] { return std::filesystem::is_socket(raise); }));
+    const int viewer = OpenSocket(sockets + "Help", "", true);
+    ASSERT_TRUE(first.WaitForShown());
+    pollfd asked = {viewer, POLLIN, 0};
+    ASSERT_TRUE(WaitFor([&] { return poll(&asked, 1, 0) == 1; })) << "F1 tries the viewer";
+
+    const std::string connect = "\x0a" + Block("IPC START", 9);
+    const struct
+    {
+        std::string socket, bytes;
+    } peers[] = {
+        {raise, ""},                             // silent
+        {raise, "\x0a" + Block("IPC", 9)},       // half a topic
+        {raise, "\x0a" + Block("", 0xffffffff)}, // a 4 GiB topic
+        // a 4 GiB poke after a proper topic
+        {raise, connect + "\x03" + Block("Application", 11) + "\x01" + Block("", 0xffffffff)},
+        {sockets + "LaunchPad", ""},                                          // silent
+        {sockets + "LaunchPad", connect + "\x03" + Block("Application", 11)}, // half a poke
+    };
+    std::vector<int> open;
+    Args files;
+    for (const auto& peer : peers) {
+        SCOPED_TRACE(&peer - peers);
+        open.push_back(OpenSocket(peer.socket, peer.bytes));
+        files.push_back(profiles.Path() + "/" + std::to_string(&peer - peers) + ".icc");
+        ProbeRun second(install.Path(), {files.back()}, env);
+        int status = 0;
+        ASSERT_TRUE(second.WaitForExit(10000, status));
+        EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status;
+    }
+    std::multiset<Args> opened;
+    // One record more: the viewer's.
+    for (const StandinRecord& record : WaitForRecords(log, files.size() + 1))
+        if (!record.args.empty())
+            opened.insert(record.args);
+    EXPECT_EQ(opened.size(), files.size());
+    for (const std::string& file : files)
+        EXPECT_EQ(opened.count({file}), 1u) << file;
+    for (size_t i = 0; i < open.size(); ++i) {
+        EXPECT_TRUE(WaitFor([&] { return EndedByPeer(open[i]); })) << i;
+        close(open[i]);
+    }
+
+    // Its frame still closes with a silent peer connected, and the process ends.
+    const int silent = OpenSocket(raise, "");
+    unsigned long frame = 0;
+    ASSERT_TRUE(WaitFor([&] { return (frame = WindowOf(first.Pid(), "Veltrona")) != 0; }));
+    CloseWindow(frame);
+    int status = 0;
+    EXPECT_TRUE(first.WaitForExit(10000, status));
+    close(silent);
+    close(viewer);
 }
 
 // Each poke on its own, to a running copy whose frame is still hidden.
@@ -115,6 +219,9 @@ TEST(RaiseServiceTest, OnlyWellFormedRaisePokesAreProcessed)
     app->m_frame->Destroy();
     EXPECT_FALSE(connection.OnPoke("IPC START", "Application", "Raise", 6, wxIPC_UTF8TEXT));
     app->m_frame = nullptr;
+    // One not made yet, at start-up: the path waits for it.
+    EXPECT_TRUE(connection.OnPoke("IPC START", "Application", "Raise* /g.icc", 13, wxIPC_TEXT));
+    EXPECT_EQ(app->m_queuedFiles.back(), "/g.icc");
     app->m_queuedFiles.clear();
 }
 

@@ -1,5 +1,5 @@
 // Contextual help as a user meets it: the launcher's help command with the help
-// viewer installed, missing, or installed but never answering.
+// viewer installed or missing. (A viewer that never answers: RaiseServiceTest.)
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
@@ -18,21 +18,15 @@ namespace fs = std::filesystem;
 
 TEST(ContextualHelpTest, HelpCommandShowsTheLauncherPageInTheViewer)
 {
-    const struct
-    {
-        std::string viewer; // installed as the help viewer; the module stand-in never serves
-        long minMs, maxMs;  // how long the command keeps the launcher busy
-    } cases[] = {
-        {VELTRONA_HELPVIEWER_PATH, 0, 10000}, {"", 0, 1000}, {VELTRONA_STANDIN_PATH, 9500, 13000}};
-    for (const auto& c : cases) {
-        SCOPED_TRACE(c.viewer);
+    for (const std::string viewer : {VELTRONA_HELPVIEWER_PATH, ""}) {
+        SCOPED_TRACE(viewer);
         StandinDir install({}), runtime({});
         const std::string page = install.Path() + "/Documentation/en/Help/Launcher.html";
         fs::create_directories(fs::path(page).parent_path());
         std::ofstream(page) << "<p>Launcher</p>";
-        if (!c.viewer.empty()) {
+        if (!viewer.empty()) {
             fs::create_directories(install.Path() + "/Help");
-            fs::create_symlink(c.viewer, install.Path() + "/Help/Veltrona Help.exe");
+            fs::create_symlink(viewer, install.Path() + "/Help/Veltrona Help.exe");
         }
         // The viewer is looked for beside the executable itself, not beside a link to it.
         fs::create_hard_link(VELTRONA_PROBE_PATH, install.Path() + "/Veltrona.exe");
@@ -44,17 +38,13 @@ TEST(ContextualHelpTest, HelpCommandShowsTheLauncherPageInTheViewer)
                            {"VELTRONA_HELP_LOG", log},
                            {"VELTRONA_PROBE_COMMAND", "1015"}});
         ASSERT_TRUE(WaitFor([&] { return launcher.Events("command").size() == 2; }, 30000));
-        const auto command = launcher.Events("command");
-        const long ms = std::stol(command[1].fields[1]) - std::stol(command[0].fields[1]);
-        EXPECT_TRUE(ms >= c.minMs && ms <= c.maxMs) << ms << " ms";
-
-        const auto viewers = ReadRecords(starts);
+        const auto viewers = viewer.empty() ? ReadRecords(starts) : WaitForRecords(starts, 1);
         std::shared_ptr<void> stop(nullptr, [viewers](void*) {
             for (const StandinRecord& viewer : viewers)
                 kill(viewer.pid, SIGKILL);
         });
-        ASSERT_EQ(viewers.size(), c.viewer.empty() ? 0u : 1u);
-        if (c.viewer != VELTRONA_HELPVIEWER_PATH)
+        ASSERT_EQ(viewers.size(), viewer.empty() ? 0u : 1u);
+        if (viewer.empty())
             continue;
         EXPECT_EQ(viewers[0].exe, install.Path() + "/Help/Veltrona Help.exe");
         EXPECT_EQ(viewers[0].cwd, install.Path());

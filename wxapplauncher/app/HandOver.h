@@ -5,7 +5,7 @@
 #include <wx/string.h>
 
 // Pokes "Raise", or "Raise* " and `path`, to `service`. A running copy that
-// holds the lock but has no service yet is tried again for up to 2 s. The whole
-// hand-over is bounded to a few seconds: a copy that does not answer in time
-// ends this process silently, whatever the toolkit is waiting for.
-void HandOverToRunningCopy(const wxString& service, const wxString& path);
+// holds the lock but has no service yet is tried again for up to 2 s; the whole
+// hand-over ends within a few seconds, however the running copy behaves. True
+// once the poke is on its way to a copy that accepted the conversation.
+bool HandOverToRunningCopy(const wxString& service, const wxString& path);

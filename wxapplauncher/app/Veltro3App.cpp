@@ -91,10 +91,10 @@ bool Veltro3App::OnInit()
 
     const wxString serviceName = instanceName + ".ipc";
     if (m_singleInstanceChecker->IsAnotherRunning()) {
-        HandOverToRunningCopy(serviceName, m_commandLineFile);
-        // The toolkit does not call OnExit after a failed OnInit.
-        OnExit();
-        return false;
+        // A later copy ends without a window: 0 when its request reached the
+        // running copy, so that whoever started it (a file manager) sees success.
+        m_handOverStatus = HandOverToRunningCopy(serviceName, m_commandLineFile) ? 0 : 1;
+        return true;
     }
 
     m_launcherServer = new Veltro3AppLauncherIPCServer;
@@ -121,6 +121,13 @@ bool Veltro3App::OnInit()
     return true;
 }
 
+int Veltro3App::OnRun()
+{
+    if (m_handOverStatus >= 0)
+        return m_handOverStatus;
+    return wxApp::OnRun();
+}
+
 int Veltro3App::OnExit()
 {
     if (wxTheClipboard)
@@ -140,7 +147,8 @@ int Veltro3App::OnExit()
 
 void Veltro3App::OnIdle(wxIdleEvent& event)
 {
-    if (m_initialised && m_deferredStartupPending && m_frame) // not while the splash yields in OnInit
+    // Not while the splash yields in OnInit, before the frame is made.
+    if (m_initialised && m_deferredStartupPending && m_frame)
         RunDeferredStartup();
     event.Skip();
 }

@@ -21,6 +21,8 @@ public:
     ~Veltro3App() override;
 
     bool OnInit() override;
+    // A later copy that handed over ends here with its status, without an event loop.
+    int OnRun() override;
     int OnExit() override;
 
     void OnIdle(wxIdleEvent& event);
@@ -47,6 +49,8 @@ public:
 private:
     // The first command-line argument, absolute; empty when it cannot be used.
     wxString m_commandLineFile;
+    // The exit status of a later copy once it has handed over; -1 in the running copy.
+    int m_handOverStatus = -1;
 
     wxDECLARE_EVENT_TABLE();
 };

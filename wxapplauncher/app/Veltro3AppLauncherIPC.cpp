@@ -16,10 +16,14 @@ bool Veltro3AppLauncherIPCConnection::OnPoke(const wxString&, const wxString& it
     if (item != "Application")
         return false;
     Veltro3App* app = GetVeltro3App();
+    if (!app)
+        return false;
     // The frame the application still knows, not one being destroyed: a poke
-    // during shutdown changes nothing.
-    Veltro3AppFrame* frame = app ? app->m_frame : nullptr;
-    if (!frame || frame->IsBeingDeleted() || app->GetTopWindow() != frame)
+    // during shutdown changes nothing. Before the frame is made (the start-up
+    // splash lets events through meanwhile) a path waits like any other.
+    Veltro3AppFrame* frame = app->m_frame;
+    const bool frameToCome = !frame && app->m_deferredStartupPending;
+    if (!frameToCome && (!frame || frame->IsBeingDeleted() || app->GetTopWindow() != frame))
         return false;
 
     wxString text;
@@ -30,7 +34,7 @@ bool Veltro3AppLauncherIPCConnection::OnPoke(const wxString&, const wxString& it
         return false;
 
     // A frame still hidden behind the splash screen is neither shown nor raised.
-    if (frame->IsShown()) {
+    if (frame && frame->IsShown()) {
         if (frame->IsIconized())
             frame->Iconize(false);
         frame->Raise();

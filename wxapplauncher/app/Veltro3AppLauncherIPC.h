@@ -11,14 +11,14 @@ public:
     wxConnectionBase* OnAcceptConnection(const wxString& topic) override;
 };
 
-// Receives into the toolkit's growing buffer, so a path of any length arrives whole.
-class Veltro3AppLauncherIPCConnection : public wxTCPConnection
+class Veltro3AppLauncherIPCConnection : public IpcConnection
 {
 public:
     // "Raise" brings the main frame up (restoring it when minimised) once it is
     // shown; "Raise* <path>" also opens the path in Inspect. False, and nothing
     // changes, for another item, text that is not acceptable poke text, text not
-    // starting with "Raise", a "*" without the blank after it, or no main frame.
+    // starting with "Raise", a "*" without the blank after it, or no main frame
+    // (but one start-up has still to make: its path waits for it).
     bool OnPoke(const wxString& topic, const wxString& item, const void* data, size_t size,
                 wxIPCFormat format) override;
 };

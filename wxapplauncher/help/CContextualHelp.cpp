@@ -31,8 +31,10 @@ const ApplicationRow kApplications[] = {
     {"Quenta Display Studio", "DisplayStudio"},
 };
 
-const int kViewerWaitMs = 10000;
+const auto kViewerWait = std::chrono::milliseconds(10000);
 const int kViewerRetryMs = 250;
+// Each attempt holds the GUI thread at most this long.
+const int kViewerAttemptMs = 250;
 
 // The installation folder, with its trailing separator; the monitor module
 // lives one folder below it.
@@ -47,9 +49,9 @@ wxString InstallationDir()
 
 } // namespace
 
-CContextualHelp::CContextualHelp(const wxString& appName)
-    : m_server(nullptr), m_appName(appName), m_showingTopic(false)
+CContextualHelp::CContextualHelp(const wxString& appName) : m_server(nullptr), m_appName(appName)
 {
+    m_viewerWait.Bind(wxEVT_TIMER, [this](wxTimerEvent&) { TryViewer(); });
 }
 
 CContextualHelp::~CContextualHelp()
@@ -86,11 +88,8 @@ void CContextualHelp::StartServer()
 
 void CContextualHelp::ShowTopic(const wxString& page)
 {
-    // The socket waits below dispatch events, a second F1 among them.
-    if (m_showingTopic)
+    if (m_viewerWait.IsRunning())
         return;
-    m_showingTopic = true;
-    std::shared_ptr<void> done(nullptr, [this](void*) { m_showingTopic = false; });
     wxLogNull noLog;
 
     const wxString installDir = InstallationDir();
@@ -104,19 +103,24 @@ void CContextualHelp::ShowTopic(const wxString& page)
     wxSetWorkingDirectory(previousDir);
 
     // One deadline for the whole wait: attempts that each time out must not add up.
-    using Clock = std::chrono::steady_clock;
-    const auto deadline = Clock::now() + std::chrono::milliseconds(kViewerWaitMs);
+    m_viewerDeadline = std::chrono::steady_clock::now() + kViewerWait;
+    m_waitingPage = page;
+    m_viewerWait.Start(kViewerRetryMs, wxTIMER_ONE_SHOT);
+}
+
+void CContextualHelp::TryViewer()
+{
+    wxLogNull noLog;
+    const auto left = std::chrono::duration_cast<std::chrono::milliseconds>(
+                          m_viewerDeadline - std::chrono::steady_clock::now())
+                          .count();
+    if (left <= 0)
+        return;
     IpcClient client;
-    std::unique_ptr<wxConnectionBase> connection;
-    while (!connection) {
-        wxMilliSleep(kViewerRetryMs);
-        const auto left =
-            std::chrono::duration_cast<std::chrono::milliseconds>(deadline - Clock::now()).count();
-        if (left <= 0)
-            return;
-        connection.reset(
-            client.Connect(m_helpService, "IPC START",
-                           static_cast<int>(std::min<long long>(left, kIpcConnectTimeoutMs))));
-    }
-    connection->Poke("Application", m_applicationId + "$" + page);
+    std::unique_ptr<wxConnectionBase> connection(client.Connect(
+        m_helpService, "IPC START", static_cast<int>(std::min<long long>(left, kViewerAttemptMs))));
+    if (connection)
+        connection->Poke("Application", m_applicationId + "$" + m_waitingPage);
+    else
+        m_viewerWait.Start(kViewerRetryMs, wxTIMER_ONE_SHOT);
 }

@@ -3,6 +3,9 @@
 #pragma once
 
 #include <wx/string.h>
+#include <wx/timer.h>
+
+#include <chrono>
 
 class CContextualIPCServer;
 
@@ -21,9 +24,10 @@ public:
     void IdentifyApplication();
     // Registers m_serviceName; on failure the launcher runs on without it.
     void StartServer();
-    // Starts the help viewer and sends it "<application id>$<page>". Waits at
-    // most about ten seconds for the viewer; returns at once when it is not
-    // installed or when another request is still waiting.
+    // Starts the help viewer and sends it "<application id>$<page>" once it
+    // answers, for at most about ten seconds. The wait runs on the event loop,
+    // so the launcher goes on serving its window and its services meanwhile.
+    // Does nothing when the viewer is not installed or while a request waits.
     void ShowTopic(const wxString& page);
 
     CContextualIPCServer* m_server;
@@ -33,5 +37,10 @@ public:
     wxString m_helpService;
 
 private:
-    bool m_showingTopic;
+    void TryViewer();
+
+    // Runs while a request waits for the viewer.
+    wxTimer m_viewerWait;
+    std::chrono::steady_clock::time_point m_viewerDeadline;
+    wxString m_waitingPage;
 };

@@ -12,7 +12,7 @@ public:
 
 // Answers every poke as not processed: the viewer's only message, one that
 // contains "Exit", asks nothing of the launcher.
-class CContextualIPCConnection : public wxTCPConnection
+class CContextualIPCConnection : public IpcConnection
 {
 public:
     bool OnPoke(const wxString& topic, const wxString& item, const void* data, size_t size,

@@ -1,100 +1,75 @@
 #include "platform/Ipc.h"
 
+#include "platform/IpcWire.h"
 #include "platform/PrivateRuntimeDir.h"
 
 #include <cerrno>
-#include <chrono>
-#include <cstdint>
 #include <cstring>
+#include <limits>
 #include <poll.h>
-#include <string>
 #include <sys/socket.h>
-#include <sys/stat.h>
 #include <sys/un.h>
 #include <thread>
 #include <unistd.h>
 
 namespace {
 
-// The toolkit's wire codes for opening and closing a conversation.
-const unsigned char kIpcConnect = 10;
-const unsigned char kIpcDisconnect = 11;
-
 using Clock = std::chrono::steady_clock;
 
-int MillisecondsLeft(Clock::time_point deadline)
+// Waits for `events` on `fd` until the deadline; false when it passed first.
+bool WaitUntil(int fd, short events, Clock::time_point deadline)
 {
-    const auto left =
-        std::chrono::duration_cast<std::chrono::milliseconds>(deadline - Clock::now()).count();
-    return left > 0 ? static_cast<int>(left) : 0;
+    for (;;) {
+        const auto left =
+            std::chrono::duration_cast<std::chrono::milliseconds>(deadline - Clock::now()).count();
+        pollfd waiting = {fd, events, 0};
+        const int ready = poll(&waiting, 1, left > 0 ? static_cast<int>(left) : 0);
+        if (ready >= 0 || errno != EINTR)
+            return ready == 1;
+    }
 }
 
-class FileDescriptor
+bool SendAll(int fd, const std::string& bytes, Clock::time_point deadline)
 {
-public:
-    explicit FileDescriptor(int fd) : m_fd(fd) {}
-    ~FileDescriptor()
-    {
-        if (m_fd >= 0)
-            close(m_fd);
-    }
-    FileDescriptor(const FileDescriptor&) = delete;
-    FileDescriptor& operator=(const FileDescriptor&) = delete;
-    int Get() const { return m_fd; }
-
-private:
-    int m_fd;
-};
-
-// Opens a conversation on `topic` as the toolkit's client does and waits, up to
-// the deadline, for the server's answer. The toolkit's own client is used only
-// once a server has shown that it answers; it would otherwise wait for minutes.
-bool ServerAnswers(const std::string& path, const wxString& topic, Clock::time_point deadline)
-{
-    sockaddr_un address = {};
-    address.sun_family = AF_UNIX;
-    std::memcpy(address.sun_path, path.c_str(), path.size() + 1);
-
-    FileDescriptor socketFd(socket(AF_UNIX, SOCK_STREAM | SOCK_NONBLOCK | SOCK_CLOEXEC, 0));
-    if (socketFd.Get() < 0)
-        return false;
-    // A full backlog (a server that stopped accepting) answers EAGAIN at once.
-    while (connect(socketFd.Get(), reinterpret_cast<const sockaddr*>(&address), sizeof address) !=
-           0) {
-        if (errno != EAGAIN || MillisecondsLeft(deadline) == 0)
+    for (size_t sent = 0; sent < bytes.size();) {
+        const ssize_t n =
+            send(fd, bytes.data() + sent, bytes.size() - sent, MSG_NOSIGNAL | MSG_DONTWAIT);
+        if (n > 0)
+            sent += static_cast<size_t>(n);
+        else if (n < 0 && errno != EINTR && (errno != EAGAIN || !WaitUntil(fd, POLLOUT, deadline)))
             return false;
-        std::this_thread::sleep_for(std::chrono::milliseconds(20));
     }
-
-    const std::string name(topic.utf8_str());
-    std::string request(1, static_cast<char>(kIpcConnect));
-    const auto length = static_cast<std::uint32_t>(name.size());
-    for (int shift = 0; shift < 32; shift += 8)
-        request += static_cast<char>((length >> shift) & 0xff);
-    request += name;
-    if (send(socketFd.Get(), request.data(), request.size(), MSG_NOSIGNAL) !=
-        static_cast<ssize_t>(request.size()))
-        return false;
-
-    pollfd waiting = {socketFd.Get(), POLLIN, 0};
-    int ready;
-    do
-        ready = poll(&waiting, 1, MillisecondsLeft(deadline));
-    while (ready < 0 && errno == EINTR);
-    unsigned char answer = 0;
-    if (ready != 1 || recv(socketFd.Get(), &answer, 1, 0) != 1 || answer != kIpcConnect)
-        return false;
-    send(socketFd.Get(), &kIpcDisconnect, 1, MSG_NOSIGNAL);
     return true;
 }
 
-// Ends with the caller's delete only; the toolkit's default deletes a
-// connection whose peer went away, behind the back of whoever holds it.
-class OwnedConnection : public wxTCPConnection
+std::string IpcName(const wxString& name)
 {
-public:
-    bool OnDisconnect() override { return true; }
-};
+    const std::string bytes(name.utf8_str());
+    std::string block;
+    AppendIpcBlock(block, bytes.data(), static_cast<std::uint32_t>(bytes.size()));
+    return block;
+}
+
+// Opens a socket to the server at `path`; -1 when there is none or its queue
+// stays full until the deadline.
+int OpenSocket(const wxString& path, Clock::time_point deadline)
+{
+    sockaddr_un address = {};
+    address.sun_family = AF_UNIX;
+    const std::string bytes(path.utf8_str());
+    std::memcpy(address.sun_path, bytes.c_str(), bytes.size() + 1);
+    const int fd = socket(AF_UNIX, SOCK_STREAM | SOCK_NONBLOCK | SOCK_CLOEXEC, 0);
+    // A full queue (a server that stopped accepting) answers EAGAIN at once.
+    while (fd >= 0 &&
+           connect(fd, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0) {
+        if ((errno != EAGAIN && errno != EINTR) || Clock::now() >= deadline) {
+            close(fd);
+            return -1;
+        }
+        std::this_thread::sleep_for(std::chrono::milliseconds(20));
+    }
+    return fd;
+}
 
 } // namespace
 
@@ -112,31 +87,32 @@ wxString GetServiceSocketPath(const wxString& service)
     return path;
 }
 
-IpcServer::~IpcServer()
+IpcConnection::~IpcConnection()
 {
-    // The toolkit's destructor removes whatever file is at the path now.
-    if (!m_filename.empty()) {
-        struct stat info;
-        if (lstat(m_filename.utf8_str(), &info) == 0 && info.st_dev == m_device &&
-            info.st_ino == m_inode)
-            unlink(m_filename.utf8_str());
-        m_filename.clear();
-    }
+    Disconnect();
 }
 
-bool IpcServer::Create(const wxString& service)
+bool IpcConnection::Disconnect()
 {
-    const wxString path = GetServiceSocketPath(service);
-    struct stat info;
-    if (path.empty() || !wxTCPServer::Create(path) || lstat(path.utf8_str(), &info) != 0 ||
-        !S_ISSOCK(info.st_mode)) {
-        // A failed bind leaves the path behind as if it were ours.
-        m_filename.clear();
-        return false;
+    if (m_fd >= 0) {
+        const char bye = kIpcDisconnect;
+        send(m_fd, &bye, 1, MSG_NOSIGNAL | MSG_DONTWAIT);
+        close(m_fd);
+        m_fd = -1;
     }
-    m_device = info.st_dev;
-    m_inode = info.st_ino;
+    SetConnected(false);
     return true;
+}
+
+bool IpcConnection::DoPoke(const wxString& item, const void* data, size_t size, wxIPCFormat format)
+{
+    if (m_fd < 0 || size > std::numeric_limits<std::uint32_t>::max())
+        return false;
+    std::string message(1, static_cast<char>(kIpcPoke));
+    message += IpcName(item);
+    message += static_cast<char>(format);
+    AppendIpcBlock(message, data, static_cast<std::uint32_t>(size));
+    return SendAll(m_fd, message, m_deadline);
 }
 
 wxConnectionBase* IpcClient::Connect(const wxString& service, const wxString& topic, int timeoutMs)
@@ -144,15 +120,23 @@ wxConnectionBase* IpcClient::Connect(const wxString& service, const wxString& to
     const wxString path = GetServiceSocketPath(service);
     if (path.empty())
         return nullptr;
-    const auto deadline = Clock::now() + std::chrono::milliseconds(timeoutMs);
-    if (!ServerAnswers(std::string(path.utf8_str()), topic, deadline))
+    auto connection = std::make_unique<IpcConnection>();
+    connection->m_deadline = Clock::now() + std::chrono::milliseconds(timeoutMs);
+    connection->m_fd = OpenSocket(path, connection->m_deadline);
+    const int fd = connection->m_fd;
+    unsigned char answer = kIpcFail;
+    if (fd < 0 ||
+        !SendAll(fd, std::string(1, static_cast<char>(kIpcConnect)) + IpcName(topic),
+                 connection->m_deadline) ||
+        !WaitUntil(fd, POLLIN, connection->m_deadline) || recv(fd, &answer, 1, 0) != 1 ||
+        answer != kIpcConnect) {
+        // No conversation was opened: nothing to end.
+        if (fd >= 0)
+            close(fd);
+        connection->m_fd = -1;
         return nullptr;
-    return MakeConnection("localhost", path, topic);
-}
-
-wxConnectionBase* IpcClient::OnMakeConnection()
-{
-    return new OwnedConnection;
+    }
+    return connection.release();
 }
 
 bool ReadPokeText(const void* data, size_t size, wxIPCFormat format, wxString& text)
