@@ -158,6 +158,8 @@ public:
     wxString m_topic;
     // Inside its OnPoke, which may run nested event loops: not dropped meanwhile.
     bool m_busy = false;
+    // Its stream ended while busy: dropped once the poke in progress returns.
+    bool m_ended = false;
 };
 
 IpcListener::IpcListener(IpcServer& server, int fd, const std::string& path)
@@ -208,8 +210,17 @@ void IpcListener::Serve(IpcPeer& peer)
         return;
     if (got > 0)
         peer.m_input.append(chunk, static_cast<size_t>(got));
+    if (got <= 0)
+        peer.m_ended = true;
+    // A nested event loop inside the peer's own OnPoke: the handling further up
+    // the stack goes on with what arrived, and drops the peer when it is done.
+    if (peer.m_busy) {
+        if (peer.m_ended)
+            peer.m_source.reset();
+        return;
+    }
     // The end of the stream ends the conversation once what came before is handled.
-    if (!HandleMessages(peer) || got <= 0)
+    if (!HandleMessages(peer) || peer.m_ended)
         Drop(peer);
 }
 
