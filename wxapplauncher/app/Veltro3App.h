@@ -20,6 +20,7 @@ public:
     Veltro3App();
     ~Veltro3App() override;
 
+    bool Initialize(int& argc, wxChar** argv) override;
     bool OnInit() override;
     int OnExit() override;
 
