@@ -11,7 +11,6 @@
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
-#include <vector>
 
 namespace {
 
@@ -34,27 +33,20 @@ WestonServer::WestonServer(int width, int height, bool xwayland)
     mkdir("/tmp/.X11-unix", 01777);
     chmod("/tmp/.X11-unix", 01777);
 
-    // Weston tells its clients' X DISPLAY in its log only: it waits for that line.
+    // Weston tells XWayland's DISPLAY to its own clients' environment and to its log only:
+    // the log is read at each change until the line is there.
     const std::string log = m_runtimeDir + "/weston.log";
     const int watch = inotify_init1(IN_CLOEXEC);
     inotify_add_watch(watch, dir, IN_CREATE | IN_MODIFY);
-    std::vector<std::string> args = {"weston",
-                                     "--backend=headless-backend.so",
-                                     "--no-config",
-                                     std::string("--socket=") + Socket(),
-                                     "--width=" + std::to_string(width),
-                                     "--height=" + std::to_string(height),
-                                     "--log=" + log};
-    if (xwayland)
-        args.push_back("--xwayland");
-    std::vector<char*> argv;
-    for (std::string& arg : args)
-        argv.push_back(arg.data());
-    argv.push_back(nullptr);
+    const std::string options[] = {"--width=" + std::to_string(width),
+                                   "--height=" + std::to_string(height), "--log=" + log,
+                                   std::string("--socket=") + Socket()};
     m_pid = fork();
     if (m_pid == 0) {
         setenv("XDG_RUNTIME_DIR", dir, 1);
-        execvp(argv[0], argv.data());
+        execlp("weston", "weston", "--backend=headless-backend.so", "--no-config",
+               options[0].c_str(), options[1].c_str(), options[2].c_str(), options[3].c_str(),
+               xwayland ? "--xwayland" : nullptr, nullptr);
         _exit(127);
     }
 

@@ -19,6 +19,7 @@ public:
     const char* Socket() const { return "wayland-test"; }
     // True once weston serves clients (and XWayland listens, when asked for).
     bool Ready() const { return m_ready; }
+    pid_t Pid() const { return m_pid; }
     // XWayland's ":N", empty without it.
     const std::string& Display() const { return m_display; }
 
