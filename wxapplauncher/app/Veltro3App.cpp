@@ -52,9 +52,9 @@ bool Veltro3App::Initialize(int& argc, wxChar** argv)
     // The desktop entry's name: the Wayland app_id and the X11 instance name (its class
     // stays "Veltrona", the entry's StartupWMClass).
     g_set_prgname("veltrona");
-    // The frame's fixed size, the Verify raise and the splash's blend with the screen need
-    // X11, so on a Wayland session the launcher runs through XWayland when it can. This
-    // process only: the modules inherit no GDK_BACKEND, and a user's GDK_BACKEND still wins.
+    // The frame's fixed size and the Verify raise need X11, so on a Wayland session the
+    // launcher runs through XWayland when it can. This process only: the modules inherit no
+    // GDK_BACKEND, and a user's GDK_BACKEND still wins.
     gdk_set_allowed_backends("x11,*");
     return wxApp::Initialize(argc, argv);
 }
