@@ -17,6 +17,8 @@ packages=(
     xvfb
     xauth
     openbox
+    weston
+    xwayland
     xdotool
     x11-utils
     wmctrl

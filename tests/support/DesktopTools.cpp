@@ -74,6 +74,18 @@ wxImage ScreenPixels(const wxRect& rect)
     return pixels;
 }
 
+wxSize WindowSize(unsigned long window)
+{
+    wxSize size;
+    if (Display* display = XOpenDisplay(nullptr)) {
+        XWindowAttributes attributes;
+        if (XGetWindowAttributes(display, window, &attributes))
+            size = wxSize(attributes.width, attributes.height);
+        XCloseDisplay(display);
+    }
+    return size;
+}
+
 void MinimiseWindow(unsigned long window)
 {
     std::system(("xdotool windowminimize " + std::to_string(window)).c_str());

@@ -16,9 +16,13 @@ void CloseWindow(unsigned long window);
 
 class wxImage;
 class wxRect;
+class wxSize;
 
 // What the screen shows in a rectangle given in screen coordinates.
 wxImage ScreenPixels(const wxRect& rect);
+
+// The size of the window itself, without the window manager's frame; (0, 0) if none.
+wxSize WindowSize(unsigned long window);
 
 // Minimises the window as its title bar's button does, through the window manager.
 void MinimiseWindow(unsigned long window);

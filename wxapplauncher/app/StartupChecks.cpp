@@ -3,6 +3,8 @@
 #include <wx/msgdlg.h>
 #include <wx/settings.h>
 
+#include <gdk/gdk.h>
+
 namespace {
 
 struct Resolution
@@ -15,6 +17,15 @@ const Resolution kResolutionPresets[] = {
     {800, 600},  {1024, 768},  {1152, 864}, {1280, 768},
     {1280, 960}, {1280, 1024}, {1280, 600}, {1280, 720},
 };
+
+// A Wayland display may have no input seat at all (a headless or kiosk compositor). GTK's
+// message box first releases the pointer, which GDK then looks up on the missing seat and
+// crashes; and no one could answer the box there anyway.
+bool HasInputSeat()
+{
+    GdkDisplay* display = gdk_display_get_default();
+    return display && gdk_display_get_default_seat(display);
+}
 
 } // namespace
 
@@ -35,10 +46,11 @@ bool Veltro3App::CheckScreenResolution(int preset)
     if (screenWidth >= width && screenHeight >= height)
         return true;
 
-    wxMessageBox(
-        wxString::Format(
-            _("Please set your monitor to a supported resolution.\nMinimum required: %d x %d"),
-            width, height),
-        wxString(), wxOK | wxCENTRE);
+    if (HasInputSeat())
+        wxMessageBox(
+            wxString::Format(
+                _("Please set your monitor to a supported resolution.\nMinimum required: %d x %d"),
+                width, height),
+            wxString(), wxOK | wxCENTRE);
     return false;
 }

@@ -12,7 +12,6 @@
 #include "resources/Catalogs.h"
 #include "settings/UpdateCheck.h"
 
-#include <wx/clipbrd.h>
 #include <wx/filename.h>
 #include <wx/filesys.h>
 #include <wx/fs_mem.h>
@@ -20,6 +19,8 @@
 #include <wx/stdpaths.h>
 #include <wx/timer.h>
 #include <wx/utils.h>
+
+#include <gdk/gdk.h>
 
 namespace {
 const int kSplashMilliseconds = 2000;
@@ -45,6 +46,18 @@ Veltro3App::Veltro3App()
 }
 
 Veltro3App::~Veltro3App() = default;
+
+bool Veltro3App::Initialize(int& argc, wxChar** argv)
+{
+    // The desktop entry's name: the Wayland app_id and the X11 instance name (its class
+    // stays "Veltrona", the entry's StartupWMClass).
+    g_set_prgname("veltrona");
+    // The frame's fixed size and the Verify raise need X11, so on a Wayland session the
+    // launcher runs through XWayland when it can. This process only: the modules inherit no
+    // GDK_BACKEND, and a user's GDK_BACKEND still wins.
+    gdk_set_allowed_backends("x11,*");
+    return wxApp::Initialize(argc, argv);
+}
 
 bool Veltro3App::OnInit()
 {
@@ -130,8 +143,6 @@ int Veltro3App::OnRun()
 
 int Veltro3App::OnExit()
 {
-    if (wxTheClipboard)
-        wxTheClipboard->Flush();
     delete m_splashTimer;
     m_splashTimer = nullptr;
     // The services go before the lock: a copy that takes the lock next finds

@@ -20,6 +20,7 @@ public:
     Veltro3App();
     ~Veltro3App() override;
 
+    bool Initialize(int& argc, wxChar** argv) override;
     bool OnInit() override;
     // A later copy that handed over ends here with its status, without an event loop.
     int OnRun() override;

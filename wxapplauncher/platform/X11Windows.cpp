@@ -89,25 +89,44 @@ void RequestActivation(Display* display, Window window)
                SubstructureRedirectMask | SubstructureNotifyMask, &event);
 }
 
-} // namespace
-
-bool BringWindowToFront(const char* windowClass, const char* title)
+// Every X error on a connection of our own is the window vanishing meanwhile.
+int IgnoreError(Display*, XErrorEvent*)
 {
-    GdkDisplay* gdkDisplay = gdk_display_get_default();
-    if (!gdkDisplay || !GDK_IS_X11_DISPLAY(gdkDisplay))
-        return false;
-    Display* display = GDK_DISPLAY_XDISPLAY(gdkDisplay);
+    return 0;
+}
 
-    // The window belongs to another program and may vanish at any moment.
-    gdk_x11_display_error_trap_push(gdkDisplay);
+bool Activate(Display* display, const char* windowClass, const char* title)
+{
     const Window window =
         FindWindow(display, DefaultRootWindow(display), windowClass, title, kSearchDepth);
     if (window) {
         XRaiseWindow(display, window);
         RequestActivation(display, window);
         XSetInputFocus(display, window, RevertToParent, CurrentTime);
-        XSync(display, False);
     }
-    gdk_x11_display_error_trap_pop_ignored(gdkDisplay);
+    XSync(display, False);
     return window != 0;
+}
+
+} // namespace
+
+bool BringWindowToFront(const char* windowClass, const char* title)
+{
+    GdkDisplay* gdkDisplay = gdk_display_get_default();
+    if (gdkDisplay && GDK_IS_X11_DISPLAY(gdkDisplay)) {
+        // The window belongs to another program and may vanish at any moment.
+        gdk_x11_display_error_trap_push(gdkDisplay);
+        const bool found = Activate(GDK_DISPLAY_XDISPLAY(gdkDisplay), windowClass, title);
+        gdk_x11_display_error_trap_pop_ignored(gdkDisplay);
+        return found;
+    }
+    // The launcher on Wayland itself: X11 modules still live on XWayland's DISPLAY.
+    Display* display = XOpenDisplay(nullptr);
+    if (!display)
+        return false;
+    const XErrorHandler previous = XSetErrorHandler(IgnoreError);
+    const bool found = Activate(display, windowClass, title);
+    XSetErrorHandler(previous);
+    XCloseDisplay(display);
+    return found;
 }

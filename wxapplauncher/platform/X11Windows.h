@@ -1,7 +1,8 @@
-// Finding and activating another program's top-level window on an X11 display.
+// Finding and activating another program's top-level window on an X11 display: GDK's
+// own, or, when the launcher runs on Wayland, XWayland's through DISPLAY.
 #pragma once
 
 // Looks for a top-level window whose WM_CLASS class and title are exactly the
 // given texts; raises, activates and focuses it. False when none is found or
-// the display is not X11.
+// there is no X11 display.
 bool BringWindowToFront(const char* windowClass, const char* title);
