@@ -12,7 +12,6 @@
 
 #include <gtest/gtest.h>
 #include <wx/filefn.h>
-#include <wx/gdicmn.h>
 #include <wx/menu.h>
 #include <wx/utils.h>
 
@@ -59,9 +58,8 @@ TEST(WaylandTest, RunsThroughXWaylandBesideItsModules)
     // Verify found, not started again (headless weston activates nothing and ignores raise
     // requests, so the raise itself shows nowhere); the file reached Inspect.
     ASSERT_TRUE(WaitFor([&] { return launcher.Events("command").size() == 2; }));
-    int status = 0;
     launcher.Kill(SIGKILL);
-    launcher.WaitForExit(10000, status);
+    launcher.WaitForExit();
     wxKill(verify, wxSIGKILL);
     const auto records = SettledRecords(log, weston.Pid());
     ASSERT_EQ(records.size(), 1u);

@@ -14,10 +14,7 @@ root="$work/dest$prefix"
 DESTDIR="$work/dest" cmake --install "$build" --prefix "$prefix" >/dev/null
 app="$root/lib/veltrona"
 
-# Everything of the demo installation, and what the desktop needs.
-while read -r file; do
-    [ -f "$app/$file" ] || fail "not installed: $file"
-done < <(cd "$build/demo" && find . -type f)
+# What the desktop needs (DebianPackages checks the files of the demo installation).
 for file in applications/veltrona.desktop metainfo/veltrona.metainfo.xml man/man1/veltrona.1.gz \
     icons/hicolor/{16x16,24x24,32x32,48x48,64x64,128x128,256x256}/apps/veltrona.png \
     icons/hicolor/scalable/apps/veltrona.svg; do

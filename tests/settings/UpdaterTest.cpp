@@ -27,12 +27,6 @@ std::string NextLaunch(int days, const std::string& after = "")
     return "Next\\ Launch=" + std::string(day.FormatISODate().utf8_str()) + after + "\n";
 }
 
-void Write(const std::string& path, const std::string& text)
-{
-    fs::create_directories(fs::path(path).parent_path());
-    std::ofstream(path, std::ios::binary) << text;
-}
-
 TEST(UpdaterTest, ScheduleAndSilentMark)
 {
     using Value = std::optional<std::string>;
@@ -78,16 +72,15 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
                        {"VELTRONA_STANDIN_LOG", log},
                        {"VELTRONA_STANDIN_EXIT", "1"}});
         if (test.kind == Kind::Link) {
-            Write(root + "/target", test.user);
             fs::create_directories(fs::path(user).parent_path());
-            fs::create_symlink(root + "/target", user);
+            fs::create_symlink(install.Write("target", test.user), user);
         } else if (!test.user.empty()) {
-            Write(user, test.user);
+            install.Write(user, test.user);
         }
         if (test.kind == Kind::ReadOnly)
             fs::permissions(user, fs::perms(0444));
         if (!test.system.empty())
-            Write(root + "/etc" + kSettings, test.system);
+            install.Write("etc" + kSettings, test.system);
         const wxString oldDir = wxGetCwd();
         wxSetWorkingDirectory(root);
         CheckForUpdateAtLaunch();
@@ -119,12 +112,11 @@ TEST(UpdaterTest, StartUpRemovesLeftoversAndStartsADueUpdate)
     const std::string root = install.Path(), tmp = root + "/tmp", log = root + "/starts.log";
     fs::create_directories(tmp + "/ZELUPDATE_dir");
     for (const char* name : {"/ZELUPDATE_abc", "/ZELUPDATE_open", "/other.txt", "/xZELUPDATE_abc"})
-        Write(tmp + name, "x");
+        install.Write("tmp" + std::string(name), "x");
     // Held open by this process, as by a running updater.
     const std::ifstream held(tmp + "/ZELUPDATE_open");
-    Write(root + "/target", "x");
-    fs::create_symlink(root + "/target", tmp + "/ZELUPDATE_link");
-    Write(root + "/config" + kSettings, "Silent=0\n");
+    fs::create_symlink(install.Write("target", "x"), tmp + "/ZELUPDATE_link");
+    install.Write("config" + kSettings, "Silent=0\n");
 
     ProbeRun launcher(root, {},
                       {{"XDG_RUNTIME_DIR", root},

@@ -1,9 +1,10 @@
 #include "support/DesktopTools.h"
 
+#include "platform/ScreenCapture.h"
+
 #include <wx/image.h>
 
 #include <X11/Xlib.h>
-#include <X11/Xutil.h>
 
 #include <cstdio>
 #include <cstdlib>
@@ -47,31 +48,7 @@ void CloseWindow(unsigned long window)
 
 wxImage ScreenPixels(const wxRect& rect)
 {
-    wxImage pixels(rect.width, rect.height);
-    Display* display = XOpenDisplay(nullptr);
-    if (!display)
-        return pixels;
-    XImage* image = XGetImage(display, DefaultRootWindow(display), rect.x, rect.y, rect.width,
-                              rect.height, AllPlanes, ZPixmap);
-    if (image) {
-        auto channel = [](unsigned long pixel, unsigned long mask) {
-            int shift = 0;
-            while (mask && !(mask & 1)) {
-                mask >>= 1;
-                ++shift;
-            }
-            return static_cast<unsigned char>(((pixel >> shift) & mask) * 255 / (mask ? mask : 1));
-        };
-        for (int y = 0; y < rect.height; ++y)
-            for (int x = 0; x < rect.width; ++x) {
-                const unsigned long p = XGetPixel(image, x, y);
-                pixels.SetRGB(x, y, channel(p, image->red_mask), channel(p, image->green_mask),
-                              channel(p, image->blue_mask));
-            }
-        XDestroyImage(image);
-    }
-    XCloseDisplay(display);
-    return pixels;
+    return CaptureScreen(rect);
 }
 
 wxSize WindowSize(unsigned long window)

@@ -5,19 +5,18 @@
 // VELTRONA_PROBE_COMMAND=<id>, the menu command <id> goes to the top window
 // once it is first shown, and its start and end are recorded as "command"
 // events (id, then milliseconds since the probe started).
+#include "DialogRecorder.h"
+#include "StandinRecord.h"
 #include "app/Veltro3App.h"
 
 #include <wx/app.h>
 #include <wx/eventfilter.h>
 #include <wx/frame.h>
 #include <wx/init.h>
-#include <wx/modalhook.h>
-#include <wx/msgdlg.h>
 #include <wx/textctrl.h>
 #include <wx/toplevel.h>
 
 #include <chrono>
-#include <cstdio>
 #include <cstdlib>
 #include <string>
 
@@ -34,54 +33,32 @@ std::string Elapsed()
 
 std::string Escape(const wxString& text)
 {
-    std::string out;
-    for (char c : std::string(text.utf8_str())) {
-        if (c == '\\')
-            out += "\\\\";
-        else if (c == '\n')
-            out += "\\n";
-        else if (c == '\t')
-            out += "\\t";
-        else
-            out += c;
-    }
-    return out;
+    return standin::EscapeField(text.utf8_string());
 }
 
 void Append(const std::string& line)
 {
-    const char* path = std::getenv("VELTRONA_PROBE_LOG");
-    if (!path)
-        return;
-    if (FILE* file = std::fopen(path, "a")) {
-        std::fputs((line + "\n").c_str(), file);
-        std::fclose(file);
-    }
+    if (const char* path = std::getenv("VELTRONA_PROBE_LOG"))
+        standin::AppendRecord(path, line + "\n");
 }
 
-class Recorder : public wxModalDialogHook, public wxEventFilter
+int RecordDialog(const RecordedDialog& dialog, const wxDialog* window)
+{
+    wxString controls;
+    for (const wxWindow* child : window->GetChildren()) {
+        if (const auto* field = dynamic_cast<const wxTextCtrl*>(child))
+            controls += field->GetValue() + "\n";
+        else if (const auto* control = dynamic_cast<const wxControl*>(child))
+            controls += control->GetLabel() + "\n";
+    }
+    Append("dialog\t" + Escape(dialog.message) + "\t" + Escape(dialog.caption) + "\t" +
+           std::to_string(dialog.style) + "\t" + Escape(controls));
+    return wxID_OK;
+}
+
+class ShowRecorder : public wxEventFilter
 {
 protected:
-    int Enter(wxDialog* dialog) override
-    {
-        wxString message, caption = dialog->GetTitle();
-        long style = 0;
-        if (auto* box = dynamic_cast<wxMessageDialog*>(dialog)) {
-            message = box->GetMessage();
-            style = box->GetMessageDialogStyle();
-        }
-        wxString controls;
-        for (const wxWindow* child : dialog->GetChildren()) {
-            if (const auto* field = dynamic_cast<const wxTextCtrl*>(child))
-                controls += field->GetValue() + "\n";
-            else if (const auto* control = dynamic_cast<const wxControl*>(child))
-                controls += control->GetLabel() + "\n";
-        }
-        Append("dialog\t" + Escape(message) + "\t" + Escape(caption) + "\t" +
-               std::to_string(style) + "\t" + Escape(controls));
-        return wxID_OK;
-    }
-
     int FilterEvent(wxEvent& event) override
     {
         if (event.GetEventType() == wxEVT_SHOW && static_cast<wxShowEvent&>(event).IsShown()) {
@@ -120,8 +97,9 @@ private:
 
 int main(int argc, char** argv)
 {
-    Recorder recorder;
-    recorder.Register();
+    DialogRecorder dialogs(
+        [&dialogs](wxDialog* dialog) { return RecordDialog(dialogs.Dialogs().back(), dialog); });
+    ShowRecorder recorder;
     wxEvtHandler::AddFilter(&recorder);
     // Created where the launcher's own entry point creates it, after the
     // toolkit has read the command line.

@@ -1,9 +1,9 @@
 #include "support/ProbeRun.h"
 
 #include "support/GuiWait.h"
+#include "support/ScopedEnv.h"
 #include "support/StandinLog.h"
 
-#include <cerrno>
 #include <csignal>
 #include <cstdio>
 #include <filesystem>
@@ -38,36 +38,23 @@ ProbeRun::ProbeRun(const std::string& installDir, const std::vector<std::string>
     m_log = installDir + "/probe-" + std::to_string(getpid()) + "-" +
             std::to_string(++g_probeCount) + ".log";
 
-    std::vector<std::string> environment;
-    for (char** entry = environ; *entry; ++entry) {
-        const std::string item = *entry;
-        bool replaced = item.rfind("VELTRONA_PROBE_LOG=", 0) == 0;
-        for (const auto& [name, value] : env)
-            replaced = replaced || item.rfind(name + "=", 0) == 0;
-        if (!replaced)
-            environment.push_back(item);
-    }
-    environment.push_back("VELTRONA_PROBE_LOG=" + m_log);
-    for (const auto& [name, value] : env)
-        environment.push_back(name + "=" + value);
+    EnvList environment = env;
+    environment.emplace_back("VELTRONA_PROBE_LOG", m_log);
+    const ScopedEnv scoped(environment);
 
     const std::string program = start.program.empty() ? launcher.string() : start.program;
     std::vector<std::string> argvStrings = {start.argv0.empty() ? program : start.argv0};
     argvStrings.insert(argvStrings.end(), args.begin(), args.end());
-    std::vector<char*> argvPointers, envPointers;
+    std::vector<char*> argv;
     for (std::string& s : argvStrings)
-        argvPointers.push_back(s.data());
-    argvPointers.push_back(nullptr);
-    for (std::string& s : environment)
-        envPointers.push_back(s.data());
-    envPointers.push_back(nullptr);
+        argv.push_back(s.data());
+    argv.push_back(nullptr);
 
     posix_spawn_file_actions_t actions;
     posix_spawn_file_actions_init(&actions);
     if (!start.cwd.empty())
         posix_spawn_file_actions_addchdir_np(&actions, start.cwd.c_str());
-    if (posix_spawn(&m_pid, program.c_str(), &actions, nullptr, argvPointers.data(),
-                    envPointers.data()) != 0)
+    if (posix_spawn(&m_pid, program.c_str(), &actions, nullptr, argv.data(), environ) != 0)
         m_pid = -1;
     posix_spawn_file_actions_destroy(&actions);
 }
@@ -127,11 +114,17 @@ bool ProbeRun::WaitForShown(int timeoutMs) const
 
 bool ProbeRun::WaitForExit(int timeoutMs, int& status)
 {
-    if (m_pid <= 0 || m_reaped)
-        return false;
-    m_reaped =
-        WaitFor([this, &status] { return waitpid(m_pid, &status, WNOHANG) == m_pid; }, timeoutMs);
+    if (m_pid > 0 && !m_reaped)
+        m_reaped =
+            WaitFor([this] { return waitpid(m_pid, &m_status, WNOHANG) == m_pid; }, timeoutMs);
+    status = m_status;
     return m_reaped;
+}
+
+bool ProbeRun::WaitForExit(int timeoutMs)
+{
+    int status = 0;
+    return WaitForExit(timeoutMs, status);
 }
 
 void ProbeRun::Kill(int signal)

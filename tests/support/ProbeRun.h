@@ -49,10 +49,12 @@ public:
     bool WaitForShown(int timeoutMs = 20000) const;
     // True once the process has ended; its wait status is in `status`.
     bool WaitForExit(int timeoutMs, int& status);
+    bool WaitForExit(int timeoutMs = 10000);
     void Kill(int signal);
 
 private:
     pid_t m_pid = -1;
     bool m_reaped = false;
+    int m_status = 0;
     std::string m_log;
 };

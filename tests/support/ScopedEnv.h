@@ -21,8 +21,10 @@ public:
     }
     ~ScopedEnv()
     {
-        for (const auto& [name, old] : m_saved)
-            old ? setenv(name.c_str(), old->c_str(), 1) : unsetenv(name.c_str());
+        // Backwards, so that a name given twice gets its first value back.
+        for (auto saved = m_saved.rbegin(); saved != m_saved.rend(); ++saved)
+            saved->second ? setenv(saved->first.c_str(), saved->second->c_str(), 1)
+                          : unsetenv(saved->first.c_str());
     }
 
 private:

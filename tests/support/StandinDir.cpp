@@ -2,6 +2,7 @@
 
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
 #include <stdexcept>
 
 namespace fs = std::filesystem;
@@ -18,6 +19,14 @@ StandinDir::StandinDir(const std::vector<std::string>& names)
         fs::create_directories(link.parent_path());
         fs::create_symlink(VELTRONA_STANDIN_PATH, link);
     }
+}
+
+std::string StandinDir::Write(const std::string& name, const std::string& text) const
+{
+    const fs::path path = fs::path(m_path) / name;
+    fs::create_directories(path.parent_path());
+    std::ofstream(path, std::ios::binary) << text;
+    return path.string();
 }
 
 StandinDir::~StandinDir()

@@ -16,6 +16,8 @@ public:
 
     // The directory's canonical path, as a started program sees it.
     const std::string& Path() const { return m_path; }
+    // Writes a file at `name` below the directory, making its folders; returns its path.
+    std::string Write(const std::string& name, const std::string& text) const;
 
 private:
     std::string m_path;

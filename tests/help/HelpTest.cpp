@@ -1,4 +1,6 @@
-// The help tool dialog: the page and path it shows, its fields' keys, and its
+// The launcher's help as a user meets it: the help command with the help viewer
+// installed or missing (a viewer that never answers: RaiseServiceTest), and the
+// help tool dialog with the page and path it shows, its fields' keys, and its
 // statuses for the user's real locale.
 #include "help/CHelpToolDlg.h"
 #include "help/HelpToolTextCtrl.h"
@@ -6,17 +8,55 @@
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
+#include "support/StandinLog.h"
 
 #include <gtest/gtest.h>
 #include <wx/clipbrd.h>
 #include <wx/timer.h>
 
+#include <csignal>
 #include <filesystem>
-#include <fstream>
+#include <memory>
 
 namespace {
 
 namespace fs = std::filesystem;
+
+TEST(ContextualHelpTest, HelpCommandShowsTheLauncherPageInTheViewer)
+{
+    for (const std::string viewer : {VELTRONA_HELPVIEWER_PATH, ""}) {
+        SCOPED_TRACE(viewer);
+        StandinDir install({});
+        const std::string page = install.Write("Documentation/en/Help/Launcher.html", "<p>L</p>");
+        if (!viewer.empty()) {
+            fs::create_directories(install.Path() + "/Help");
+            fs::create_symlink(viewer, install.Path() + "/Help/Veltrona Help.exe");
+        }
+        const std::string starts = install.Path() + "/starts.log",
+                          log = install.Path() + "/viewer.log";
+        ProbeRun launcher(install.Path(), {},
+                          {{"XDG_RUNTIME_DIR", install.Path()},
+                           {"VELTRONA_STANDIN_LOG", starts},
+                           {"VELTRONA_HELP_LOG", log},
+                           {"VELTRONA_PROBE_COMMAND", "1015"}});
+        ASSERT_TRUE(WaitFor([&] { return launcher.Events("command").size() == 2; }, 30000));
+        const auto viewers = viewer.empty() ? ReadRecords(starts) : WaitForRecords(starts, 1);
+        std::shared_ptr<void> stop(nullptr, [viewers](void*) {
+            for (const StandinRecord& viewer : viewers)
+                kill(viewer.pid, SIGKILL);
+        });
+        ASSERT_EQ(viewers.size(), viewer.empty() ? 0u : 1u);
+        if (viewer.empty())
+            continue;
+        EXPECT_EQ(viewers[0].exe, install.Path() + "/Help/Veltrona Help.exe");
+        EXPECT_EQ(viewers[0].cwd, install.Path());
+        ASSERT_TRUE(WaitFor([&] { return ReadEventLog(log).size() >= 2; }));
+        const auto events = ReadEventLog(log);
+        EXPECT_EQ(events[0].fields,
+                  (std::vector<std::string>{"Application", "LaunchPad$Launcher.html"}));
+        EXPECT_EQ(events[1].fields, std::vector<std::string>{page});
+    }
+}
 
 // Ctrl+A and Ctrl+C copy the path; Return and Escape end the dialog. A page named
 // with its extension keeps it.
@@ -64,20 +104,16 @@ TEST(HelpToolTest, StatusesFollowThePagesOfTheUsersLanguage)
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.lang);
-        StandinDir install({}), runtime({});
+        StandinDir install({});
         for (const auto& [folder, page] :
              {std::pair{c.launcherIn, "Launcher.html"}, {c.alternateIn, "AlternateHelp.html"}})
-            if (*folder) {
-                const std::string dir = install.Path() + "/Documentation/" + folder + "/Help/";
-                fs::create_directories(dir);
-                std::ofstream(dir + page) << "<p>help</p>";
-            }
-        fs::create_hard_link(VELTRONA_PROBE_PATH, install.Path() + "/Veltrona.exe");
+            if (*folder)
+                install.Write("Documentation/" + std::string(folder) + "/Help/" + page, "<p>h</p>");
         ProbeRun launcher(install.Path(), {},
                           {{"LANG", c.lang + std::string(".UTF-8")},
                            {"LC_ALL", ""},
                            {"LC_MESSAGES", ""},
-                           {"XDG_RUNTIME_DIR", runtime.Path()},
+                           {"XDG_RUNTIME_DIR", install.Path()},
                            {"VELTRONA_PROBE_COMMAND", "1018"}});
         ASSERT_TRUE(WaitFor([&] { return launcher.Events("command").size() == 2; }, 30000));
         const auto dialogs = launcher.Events("dialog");
