@@ -1,6 +1,9 @@
-// The resource reader and icon decoding, over the real executable and damaged copies.
+// The resource reader and icon decoding, over the real executable and damaged copies,
+// and the frame's window icons from the embedded icon group.
 #include "platform/ResourceImage.h"
+#include "frame/Veltro3AppFrame.h"
 #include "platform/IconResource.h"
+#include "resources/IconBundle.h"
 
 #include <gtest/gtest.h>
 
@@ -41,4 +44,15 @@ TEST(IconResource, DecodesBitmapsAndRejectsShortOrOversizedOnes)
     EXPECT_EQ(DecodeIconImage(dib.data(), dib.size() - 1).kind, IconImage::Kind::Invalid);
     dib[5] = 0x7F; // far wider than any icon
     EXPECT_EQ(DecodeIconImage(dib.data(), dib.size()).kind, IconImage::Kind::Invalid);
+}
+
+TEST(IconBundle, FrameCarriesTheNineTrueColourIcons)
+{
+    Veltro3AppFrame* frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
+    const wxIconBundle icons = frame->GetIcons();
+    frame->Destroy();
+    EXPECT_EQ(icons.GetIconCount(), 9u);
+    for (int side : {16, 32, 48, 64, 72, 80, 96, 128, 256})
+        EXPECT_TRUE(icons.GetIcon(wxSize(side, side), wxIconBundle::FALLBACK_NONE).IsOk()) << side;
+    EXPECT_EQ(LoadIconBundle("IDI_ICON1", 8).GetIconCount(), 3u);
 }
