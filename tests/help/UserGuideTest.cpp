@@ -38,7 +38,6 @@ public:
                  {"VELTRONA_STANDIN_EXIT", "1"}})
     {
         SetOpener(opener);
-        fs::create_directories(Root() + "/data/applications");
         // The system's MIME database and icons, without the system's programs.
         fs::create_directories(Root() + "/share");
         fs::create_symlink("/usr/share/mime", Root() + "/share/mime");
@@ -55,11 +54,11 @@ public:
 
     void InstallReader() const
     {
-        std::ofstream(Root() + "/data/applications/pdfreader.desktop")
-            << "[Desktop Entry]\nType=Application\nName=Reader\nExec=" << Root()
-            << "/pdfreader %f\nMimeType=application/pdf;\n";
-        std::ofstream(Root() + "/data/applications/mimeapps.list")
-            << "[Default Applications]\napplication/pdf=pdfreader.desktop\n";
+        m_dir.Write("data/applications/pdfreader.desktop",
+                    "[Desktop Entry]\nType=Application\nName=Reader\nExec=" + Root() +
+                        "/pdfreader %f\nMimeType=application/pdf;\n");
+        m_dir.Write("data/applications/mimeapps.list",
+                    "[Default Applications]\napplication/pdf=pdfreader.desktop\n");
     }
 
 private:
