@@ -30,12 +30,6 @@ std::string NextLaunch(int days, const std::string& after = "")
 TEST(UpdaterTest, ScheduleAndSilentMark)
 {
     using Value = std::optional<std::string>;
-    enum class Kind
-    {
-        File,
-        Link,
-        ReadOnly
-    };
     const std::string kept = "Silent=0\n# kept\n[Other]\nkey=value\n";
     // Files given as "" are not there; userAfter "" means unchanged.
     const struct
@@ -44,7 +38,7 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
         bool starts;
         Value atLaunch, fromMenu;
         std::string userAfter;
-        Kind kind = Kind::File;
+        bool readOnly = false, link = false;
     } cases[] = {
         {"", "", true, {}, {}, ""},
         {"Next\\ Launch=Never\n", "", false, {}, {}, ""},
@@ -59,8 +53,8 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
         {"Silent=abc\n", "", true, "abc", "abc", ""},
         // Not UTF-8, read-only, a link: written only through the link.
         {"Silent=0\nName=\xe9t\xe9\n", "", false, {}, "0", ""},
-        {"Silent=1\n", "", false, {}, "1", "", Kind::ReadOnly},
-        {"Silent=5\n", "", true, "1", "0", "Silent=0\n", Kind::Link},
+        {"Silent=1\n", "", false, {}, "1", "", true},
+        {"Silent=5\n", "", true, "1", "0", "Silent=0\n", false, true},
     };
     for (const auto& test : cases) {
         SCOPED_TRACE(test.user + "|" + test.system);
@@ -71,13 +65,13 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
                        {"XDG_CONFIG_DIRS", root + "/etc"},
                        {"VELTRONA_STANDIN_LOG", log},
                        {"VELTRONA_STANDIN_EXIT", "1"}});
-        if (test.kind == Kind::Link) {
+        if (test.link) {
             fs::create_directories(fs::path(user).parent_path());
             fs::create_symlink(install.Write("target", test.user), user);
         } else if (!test.user.empty()) {
             install.Write(user, test.user);
         }
-        if (test.kind == Kind::ReadOnly)
+        if (test.readOnly)
             fs::permissions(user, fs::perms(0444));
         if (!test.system.empty())
             install.Write("etc" + kSettings, test.system);
@@ -99,7 +93,7 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
         }
         EXPECT_EQ(all.back().silent, test.fromMenu);
         EXPECT_EQ(silent.ToStdString(), test.fromMenu.value_or("none"));
-        EXPECT_EQ(fs::is_symlink(user), test.kind == Kind::Link);
+        EXPECT_EQ(fs::is_symlink(user), test.link);
         std::ifstream after(user, std::ios::binary);
         EXPECT_EQ(std::string(std::istreambuf_iterator<char>(after), {}),
                   test.userAfter.empty() ? test.user : test.userAfter);
