@@ -9,8 +9,9 @@
 
 struct ProbeEvent
 {
-    std::string kind;                // "dialog" or "shown"
-    std::vector<std::string> fields; // dialog: message, caption, style; shown: title, ms
+    std::string kind; // "dialog", "shown" or "command"
+    // dialog: message, caption, style, controls; shown: title, ms; command: id, ms
+    std::vector<std::string> fields;
 };
 
 // Every line of a log of tab-separated, escaped fields, the first being the kind
