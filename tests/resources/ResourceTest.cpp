@@ -1,12 +1,15 @@
-// Catalogue resources: which start-up copies, their completeness, the menus they translate.
+// The embedded resources: the reader and icon decoding over the real executable and
+// damaged copies, the frame's window icons, and the catalogues (which start-up
+// copies, their completeness, the menus they translate).
 #include "app/UserLanguage.h"
 #include "frame/Veltro3AppFrame.h"
+#include "platform/IconResource.h"
 #include "platform/ResourceImage.h"
 #include "resources/CatalogFormat.h"
 #include "resources/Catalogs.h"
+#include "resources/IconBundle.h"
 
 #include <gtest/gtest.h>
-
 #include <wx/filesys.h>
 #include <wx/fs_mem.h>
 #include <wx/menu.h>
@@ -14,10 +17,56 @@
 #include <algorithm>
 #include <cstdio>
 #include <fstream>
+#include <iterator>
 #include <memory>
 #include <set>
 
 using Bytes = std::vector<unsigned char>;
+
+TEST(ResourceImage, DamagedFilesAndImagesYieldOnlyWholeEntries)
+{
+    std::ifstream in("/proc/self/exe", std::ios::binary);
+    Bytes exe(std::istreambuf_iterator<char>(in), {}), section;
+    auto read = [&](std::size_t size, const char* name) {
+        return ReadElfSection(MemoryByteSource(exe.data(), size), name, section);
+    };
+    ASSERT_TRUE(read(exe.size(), ".rsrc"));
+    const ResourceImage whole(section);
+    ASSERT_GT(whole.Entries().size(), 20u);
+    EXPECT_NE(whole.Find(ResourceTypeRcData, "zh_cn/veltro.mo"), nullptr) << "names ignore case";
+    for (std::size_t length = 0; length < section.size(); length += 1 + length / 7) {
+        const Bytes cut(section.begin(), section.begin() + long(length));
+        EXPECT_LT(ResourceImage(cut).Entries().size(), whole.Entries().size()) << length;
+    }
+    EXPECT_FALSE(read(exe.size(), ".rsrc2") || read(exe.size(), ".rsr"));
+    EXPECT_FALSE(read(4096, ".rsrc")); // cut before the section headers
+}
+
+TEST(IconResource, DecodesBitmapsAndRejectsShortOrOversizedOnes)
+{
+    // 2 x 2 at 8 bits: two palette colours (BGRx), rows bottom first, mask bits last.
+    Bytes dib(40, 0);
+    dib[0] = 40, dib[4] = 2, dib[8] = 4, dib[12] = 1, dib[14] = 8, dib[32] = 2;
+    dib.insert(dib.end(), {0, 0, 255, 0, 255, 0, 0, 0}); // red, blue
+    dib.insert(dib.end(), {1, 0, 0, 0, 0, 1, 0, 0});     // bottom: blue red, top: red blue
+    dib.insert(dib.end(), {0, 0, 0, 0, 0x40, 0, 0, 0});  // top right pixel transparent
+    const IconImage image = DecodeIconImage(dib.data(), dib.size());
+    EXPECT_EQ(image.rgba, (Bytes{255, 0, 0, 255, 0, 0, 255, 0, 0, 0, 255, 255, 255, 0, 0, 255}));
+    EXPECT_EQ(DecodeIconImage(dib.data(), dib.size() - 1).kind, IconImage::Kind::Invalid);
+    dib[5] = 0x7F; // far wider than any icon
+    EXPECT_EQ(DecodeIconImage(dib.data(), dib.size()).kind, IconImage::Kind::Invalid);
+}
+
+TEST(IconBundle, FrameCarriesTheNineTrueColourIcons)
+{
+    Veltro3AppFrame* frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
+    const wxIconBundle icons = frame->GetIcons();
+    frame->Destroy();
+    EXPECT_EQ(icons.GetIconCount(), 9u);
+    for (int side : {16, 32, 48, 64, 72, 80, 96, 128, 256})
+        EXPECT_TRUE(icons.GetIcon(wxSize(side, side), wxIconBundle::FALLBACK_NONE).IsOk()) << side;
+    EXPECT_EQ(LoadIconBundle("IDI_ICON1", 8).GetIconCount(), 3u);
+}
 
 namespace {
 
