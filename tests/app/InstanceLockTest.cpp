@@ -1,6 +1,4 @@
-// One copy of the launcher per user: of copies started together exactly one
-// runs, a copy killed outright never keeps the next one from starting, and
-// without XDG_RUNTIME_DIR no other user can switch the lock off.
+// One copy of the launcher per user, also without XDG_RUNTIME_DIR.
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"

@@ -41,7 +41,6 @@ int OpenSocket(const std::string& path, const std::string& bytes, bool listening
     return fd;
 }
 
-// True once the other end has closed the connection.
 bool EndedByPeer(int fd)
 {
     char bytes[64];

@@ -1,7 +1,5 @@
-// The launcher's help as a user meets it: the help command with the help viewer
-// installed or missing (a viewer that never answers: RaiseServiceTest), and the
-// help tool dialog with the page and path it shows, its fields' keys, and its
-// statuses for the user's real locale.
+// The launcher's help as a user meets it: the help command, with the viewer installed
+// or missing (one that never answers: RaiseServiceTest), and the help tool dialog.
 #include "help/CHelpToolDlg.h"
 #include "help/HelpToolTextCtrl.h"
 

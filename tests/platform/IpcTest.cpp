@@ -1,6 +1,5 @@
-// The IPC layer: sockets only in the user's private directory and only where
-// they fit, servers that remove only their own socket, and the checks on what a
-// peer pokes. (Connections that end on their deadline: RaiseServiceTest.)
+// The IPC layer's sockets and the checks on what a peer pokes (connections that
+// end on their deadline: RaiseServiceTest).
 #include "platform/Ipc.h"
 #include "support/StandinDir.h"
 

@@ -1,6 +1,5 @@
 // The embedded resources: the reader and icon decoding over the real executable and
-// damaged copies, the frame's window icons, and the catalogues (which start-up
-// copies, their completeness, the menus they translate).
+// damaged copies, the frame's window icons, and the catalogues.
 #include "app/UserLanguage.h"
 #include "frame/Veltro3AppFrame.h"
 #include "platform/IconResource.h"
