@@ -1,4 +1,5 @@
 // Start-up and shutdown of the real launcher, run as its own process.
+#include "resources/ImageSets.h"
 #include "support/DesktopTools.h"
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
@@ -7,9 +8,11 @@
 #include "support/XvfbServer.h"
 
 #include <gtest/gtest.h>
+#include <wx/image.h>
 
 #include <cstdlib>
 #include <filesystem>
+#include <functional>
 #include <memory>
 #include <set>
 #include <sys/wait.h>
@@ -18,25 +21,163 @@ namespace {
 
 using Args = std::vector<std::string>;
 
-TEST(StartupTest, ScreenOfAtLeast1024By768IsRequired)
-{
-    StandinDir install({});
-    XvfbServer small(1280, 720), exact(1024, 768);
-    ASSERT_FALSE(small.Display().empty() || exact.Display().empty());
-    ProbeRun refused(install.Path(), {},
-                     {{"XDG_RUNTIME_DIR", install.Path()}, {"DISPLAY", small.Display()}});
-    int status = 0;
-    ASSERT_TRUE(refused.WaitForExit(20000, status));
-    EXPECT_FALSE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
-    const auto events = refused.Events();
-    ASSERT_EQ(events.size(), 1u) << "one message, no window";
-    EXPECT_EQ(events[0].fields[0], "Please set your monitor to a supported resolution.\n"
-                                   "Minimum required: 1024 x 768");
+// The view's buttons, in view coordinates; the first four labels have no descenders.
+const wxPoint kButtons[] = {{228, 68}, {228, 155}, {228, 237}, {405, 155}, {405, 68}, {405, 237}};
 
-    ProbeRun accepted(install.Path(), {},
-                      {{"XDG_RUNTIME_DIR", install.Path()}, {"DISPLAY", exact.Display()}});
-    EXPECT_TRUE(accepted.WaitForShown());
-    EXPECT_TRUE(accepted.Events("dialog").empty());
+int Distance(const wxImage& a, int ax, int ay, const wxImage& b, int bx, int by)
+{
+    int sum = 0;
+    for (int c = 0; c < 3; ++c)
+        sum += std::abs(a.GetData()[3 * (ay * a.GetWidth() + ax) + c] -
+                        b.GetData()[3 * (by * b.GetWidth() + bx) + c]);
+    return sum;
+}
+
+// How far `shot` lies, over the opaque pixels of `area` of the picture, from the
+// picture's 2x rendering and from the picture doubled.
+std::pair<long, long> FromDoubledAndScaled(const wxImage& shot, const wxString& picture,
+                                           const wxRect& area)
+{
+    const wxImage normal = LoadPicture(picture, 1).ConvertToImage();
+    const wxImage doubled = LoadPicture(picture, 2).ConvertToImage();
+    long toDoubled = 0, toScaled = 0;
+    for (int y = 2 * area.y; y < 2 * area.GetBottom(); ++y)
+        for (int x = 2 * area.x; x < 2 * area.GetRight(); ++x)
+            if (doubled.GetAlpha(x, y) == 255 && normal.GetAlpha(x / 2, y / 2) == 255) {
+                toScaled += Distance(shot, x, y, doubled, x, y);
+                toDoubled += Distance(shot, x, y, normal, x / 2, y / 2);
+            }
+    return {toDoubled, toScaled};
+}
+
+// Rows and columns of ink (pixels far from the button's colour) in a label.
+wxRect LabelInk(const wxImage& view, const wxPoint& button, double scale)
+{
+    wxImage colour(1, 1);
+    colour.SetRGB(0, 0, 224, 223, 227);
+    wxRect ink;
+    for (int y = button.y * scale; y < (button.y + 58) * scale; ++y)
+        for (int x = (button.x + 64) * scale; x < (button.x + 152) * scale; ++x)
+            if (Distance(view, x, y, colour, 0, 0) > 150)
+                ink = ink.IsEmpty() ? wxRect(x, y, 1, 1) : ink.Union(wxRect(x, y, 1, 1));
+    return ink;
+}
+
+// The screen check counts logical pixels against what the windows need; the view and
+// the splash are drawn at the display's scale; large text fits its room.
+TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
+{
+    EnsureLauncherImages();
+    StandinDir install({});
+    const struct
+    {
+        int width, height;
+        const char *scale, *textScale, *refusal;
+    } cases[] = {
+        {800, 440, "1", "1", "564 x 454"}, {1024, 600, "2", "1", "1128 x 908"},
+        {1280, 720, "1", "1", nullptr},    {2560, 1440, "2", "1", nullptr},
+        {1280, 720, "1", "1.5", nullptr},
+    };
+    std::vector<std::unique_ptr<XvfbServer>> servers;
+    std::vector<std::unique_ptr<ProbeRun>> runs;
+    for (const auto& c : cases) {
+        servers.push_back(std::make_unique<XvfbServer>(c.width, c.height));
+        ASSERT_FALSE(servers.back()->Display().empty());
+        const std::string runtime = install.Path() + "/run" + std::to_string(runs.size());
+        std::filesystem::create_directory(runtime);
+        runs.push_back(std::make_unique<ProbeRun>(install.Path(), Args{},
+                                                  EnvList{{"XDG_RUNTIME_DIR", runtime},
+                                                          {"DISPLAY", servers.back()->Display()},
+                                                          {"GDK_SCALE", c.scale},
+                                                          {"GDK_DPI_SCALE", c.textScale}}));
+    }
+    // The shown window's client area on its screen, as the screen shows it once painted
+    // and settled.
+    auto shot = [&](size_t i, const std::string& title,
+                    const std::function<bool(const wxImage&)>& painted) {
+        wxImage image;
+        EXPECT_TRUE(WaitFor([&] {
+            for (const ProbeEvent& e : runs[i]->Events("placed"))
+                if (e.fields[0] == title) {
+                    const wxRect area(std::stoi(e.fields[1]), std::stoi(e.fields[2]),
+                                      std::stoi(e.fields[3]), std::stoi(e.fields[4]));
+                    const wxImage now = ScreenPixels(area, servers[i]->Display());
+                    const bool same =
+                        image.IsOk() && now.GetSize() == image.GetSize() &&
+                        std::equal(now.GetData(), now.GetData() + 3 * area.width * area.height,
+                                   image.GetData());
+                    image = now;
+                    return same && painted(now);
+                }
+            return false;
+        })) << title;
+        return image;
+    };
+    // The start-up splash at 200%, while it shows: its text is drawn last.
+    const wxImage splash = shot(3, "", [](const wxImage& image) {
+        if (image.GetSize() != wxSize(890, 850))
+            return false;
+        for (int x = 0; x < image.GetWidth(); ++x)
+            if (image.GetRed(x, 2 * 346) > 150)
+                return true;
+        return false;
+    });
+    wxImage views[5];
+    for (size_t i = 0; i < runs.size(); ++i) {
+        SCOPED_TRACE(std::to_string(cases[i].width) + " x " + std::to_string(cases[i].height) +
+                     " at " + cases[i].scale + ", text at " + cases[i].textScale);
+        if (cases[i].refusal) {
+            int status = 0;
+            ASSERT_TRUE(runs[i]->WaitForExit(20000, status));
+            EXPECT_FALSE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
+            const auto events = runs[i]->Events();
+            ASSERT_EQ(events.size(), 1u) << "one message, no window";
+            EXPECT_EQ(events[0].fields[0],
+                      std::string("Please set your monitor to a supported resolution.\n"
+                                  "Minimum required: ") +
+                          cases[i].refusal);
+            continue;
+        }
+        ASSERT_TRUE(runs[i]->WaitForShown());
+        EXPECT_TRUE(runs[i]->Events("dialog").empty());
+        const double scale = std::stod(cases[i].scale);
+        views[i] = shot(i, "Veltrona", [&](const wxImage& image) {
+            return image.GetSize() == wxSize(564, 344) * scale &&
+                   !LabelInk(image, kButtons[5], scale).IsEmpty();
+        });
+        // Every label at one size: the same baseline, and each within its button.
+        const wxRect first = LabelInk(views[i], kButtons[0], scale);
+        for (const wxPoint& button : kButtons) {
+            const wxRect ink = LabelInk(views[i], button, scale);
+            EXPECT_LE(ink.GetRight(), (button.x + 152 - 2) * scale) << button.x << "," << button.y;
+            if (&button - kButtons < 4) {
+                EXPECT_EQ(ink.GetBottom() - button.y * scale, first.GetBottom() - 68 * scale)
+                    << button.x << "," << button.y;
+            }
+        }
+    }
+
+    // The titles stay above their columns however large the text.
+    const wxImage art = LoadPicture("Veltro2AppFrame::LauncherBG", 1).ConvertToImage();
+    for (int y = 15; y < 50; ++y)
+        for (int x = 557; x < 564; ++x)
+            EXPECT_LT(Distance(views[4], x, y, art, x, y), 150) << x << "," << y;
+
+    // At 200% the pictures are their 2x renderings, the labels drawn at that resolution.
+    const auto [viewToDoubled, viewToScaled] =
+        FromDoubledAndScaled(views[3], "Veltro2AppFrame::LauncherBG", wxRect(10, 10, 190, 290));
+    EXPECT_LT(viewToScaled * 4, viewToDoubled);
+    const auto [splashToDoubled, splashToScaled] =
+        FromDoubledAndScaled(splash, "Veltro2AppFrame::SplashMainApp", wxRect(0, 0, 445, 300));
+    EXPECT_LT(splashToScaled * 4, splashToDoubled);
+    for (const wxPoint& button : kButtons) {
+        const wxRect ink = LabelInk(views[3], button, 2);
+        int unlike = 0;
+        for (int y = ink.y & ~1; y < ink.GetBottom(); y += 2)
+            for (int x = ink.x & ~1; x < ink.GetRight(); x += 2)
+                unlike += Distance(views[3], x, y, views[3], x + 1, y + 1) > 30;
+        EXPECT_GT(unlike, 20) << "label at " << button.x << "," << button.y << " is doubled";
+    }
 }
 
 // Found through PATH, through a link elsewhere, or by its path: the launcher

@@ -17,8 +17,8 @@ void CloseWindow(unsigned long window);
 class wxImage;
 class wxRect;
 
-// What the screen shows in a rectangle given in screen coordinates.
-wxImage ScreenPixels(const wxRect& rect);
+// What the screen shows in a rectangle of its pixels, on the test's display or another.
+wxImage ScreenPixels(const wxRect& rect, const std::string& display = "");
 
 // Minimises the window as its title bar's button does, through the window manager.
 void MinimiseWindow(unsigned long window);

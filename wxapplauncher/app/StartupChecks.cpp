@@ -1,44 +1,40 @@
 #include "app/Veltro3App.h"
 
+#include <wx/display.h>
 #include <wx/msgdlg.h>
 #include <wx/settings.h>
 
 namespace {
 
-struct Resolution
-{
-    int width;
-    int height;
-};
+// What the launcher's windows take on the screen, in logical pixels: the frame (its
+// 564 x 344 view under the menu bar), the start-up splash and the About box.
+const wxSize kWindowSizes[] = {{564, 369}, {445, 425}, {443, 454}};
 
-const Resolution kResolutionPresets[] = {
-    {800, 600},  {1024, 768},  {1152, 864}, {1280, 768},
-    {1280, 960}, {1280, 1024}, {1280, 600}, {1280, 720},
-};
+wxSize RequiredScreenSize()
+{
+    wxSize required;
+    for (const wxSize& size : kWindowSizes)
+        required.IncTo(size);
+    return required;
+}
 
 } // namespace
 
-void Veltro3App::GetMinimumResolution(int preset, int& width, int& height)
+bool Veltro3App::CheckScreenResolution()
 {
-    if (preset < 0 || preset >= int(WXSIZEOF(kResolutionPresets)))
-        preset = 0;
-    width = kResolutionPresets[preset].width;
-    height = kResolutionPresets[preset].height;
-}
-
-bool Veltro3App::CheckScreenResolution(int preset)
-{
-    int width = 0, height = 0;
-    GetMinimumResolution(preset, width, height);
+    // Logical pixels: on a desktop scaled to 200% a 2560 x 1440 screen offers 1280 x 720.
+    const wxSize required = RequiredScreenSize();
     const int screenWidth = wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_X, nullptr);
     const int screenHeight = wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_Y, nullptr);
-    if (screenWidth >= width && screenHeight >= height)
+    if (screenWidth >= required.x && screenHeight >= required.y)
         return true;
 
+    // The user sets the monitor in its own pixels, which the desktop's scale multiplies.
+    const double scale = wxDisplay().GetScaleFactor();
     wxMessageBox(
         wxString::Format(
             _("Please set your monitor to a supported resolution.\nMinimum required: %d x %d"),
-            width, height),
+            wxRound(required.x * scale), wxRound(required.y * scale)),
         wxString(), wxOK | wxCENTRE);
     return false;
 }

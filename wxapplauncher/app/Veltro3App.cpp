@@ -23,7 +23,6 @@
 
 namespace {
 const int kSplashMilliseconds = 2000;
-const int kMinimumResolutionPreset = 1;
 } // namespace
 
 // clang-format off
@@ -82,7 +81,7 @@ bool Veltro3App::OnInit()
 
     wxSetWorkingDirectory(launcherDir);
 
-    if (!CheckScreenResolution(kMinimumResolutionPreset))
+    if (!CheckScreenResolution())
         return false;
 
     const wxString instanceName = GetVendorName() + "." + GetAppName() + "." + wxGetUserId();
@@ -140,7 +139,8 @@ int Veltro3App::OnExit()
 
 void Veltro3App::OnIdle(wxIdleEvent& event)
 {
-    if (m_initialised && m_deferredStartupPending && m_frame) // not while the splash yields in OnInit
+    if (m_initialised && m_deferredStartupPending &&
+        m_frame) // not while the splash yields in OnInit
         RunDeferredStartup();
     event.Skip();
 }

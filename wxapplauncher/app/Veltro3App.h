@@ -26,8 +26,8 @@ public:
     void OnIdle(wxIdleEvent& event);
     void RunDeferredStartup();
     void OpenPendingFile();
-    bool CheckScreenResolution(int preset);
-    static void GetMinimumResolution(int preset, int& width, int& height);
+    // Whether the screen holds the launcher's windows; shows the message when it does not.
+    bool CheckScreenResolution();
 
     void ShowContextHelp(const wxString& page);
     void ShowHelpTool(const wxString& page);
