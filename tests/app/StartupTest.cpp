@@ -1,4 +1,8 @@
 // Start-up and shutdown of the real launcher, run as its own process.
+#include "controls/TextBitmap.h"
+#include "frame/ModuleCatalog.h"
+#include "frame/Veltro3AppFrame.h"
+#include "frame/Veltro3MainAppStandardView.h"
 #include "resources/ImageSets.h"
 #include "support/DesktopTools.h"
 #include "support/GuiWait.h"
@@ -21,8 +25,18 @@ namespace {
 
 using Args = std::vector<std::string>;
 
-// The view's buttons, in view coordinates; the first four labels have no descenders.
-const wxPoint kButtons[] = {{228, 68}, {228, 155}, {228, 237}, {405, 155}, {405, 68}, {405, 237}};
+// The view's buttons: where they lie, their modules and icons. The first four labels have no
+// descenders; the second button lies under the pointer, at the screen's centre.
+const struct
+{
+    wxPoint at;
+    int module;
+    const char* icon;
+} kButtons[] = {
+    {{228, 68}, 1001, "PrinterModule"},     {{228, 155}, 1002, "MonitorModule"},
+    {{228, 237}, 1003, "LinkStudioModule"}, {{405, 155}, 1006, "EditModule"},
+    {{405, 68}, 1005, "InspectorModule"},   {{405, 237}, 1004, "VerifierModule"},
+};
 
 int Distance(const wxImage& a, int ax, int ay, const wxImage& b, int bx, int by)
 {
@@ -33,21 +47,35 @@ int Distance(const wxImage& a, int ax, int ay, const wxImage& b, int bx, int by)
     return sum;
 }
 
-// How far `shot` lies, over the opaque pixels of `area` of the picture, from the
-// picture's 2x rendering and from the picture doubled.
-std::pair<long, long> FromDoubledAndScaled(const wxImage& shot, const wxString& picture,
-                                           const wxRect& area)
+// How far `shot`, from `at` on, lies from `scaled` and from `normal` doubled, over the
+// pixels opaque in both.
+std::pair<long, long> FromDoubledAndScaled(const wxImage& shot, const wxPoint& at,
+                                           const wxImage& normal, const wxImage& scaled)
 {
-    const wxImage normal = LoadPicture(picture, 1).ConvertToImage();
-    const wxImage doubled = LoadPicture(picture, 2).ConvertToImage();
     long toDoubled = 0, toScaled = 0;
-    for (int y = 2 * area.y; y < 2 * area.GetBottom(); ++y)
-        for (int x = 2 * area.x; x < 2 * area.GetRight(); ++x)
-            if (doubled.GetAlpha(x, y) == 255 && normal.GetAlpha(x / 2, y / 2) == 255) {
-                toScaled += Distance(shot, x, y, doubled, x, y);
-                toDoubled += Distance(shot, x, y, normal, x / 2, y / 2);
+    for (int y = 0; y < scaled.GetHeight(); ++y)
+        for (int x = 0; x < scaled.GetWidth(); ++x)
+            if (scaled.GetAlpha(x, y) == 255 && normal.GetAlpha(x / 2, y / 2) == 255) {
+                toScaled += Distance(shot, 2 * at.x + x, 2 * at.y + y, scaled, x, y);
+                toDoubled += Distance(shot, 2 * at.x + x, 2 * at.y + y, normal, x / 2, y / 2);
             }
     return {toDoubled, toScaled};
+}
+
+// A button's normal look over the view's colour, drawn at `scale`: its icon at (6, 2),
+// its label 16 pixels right of the icon, vertically centred.
+wxImage ButtonAt(wxWindow* view, int index, double scale)
+{
+    const auto& button = kButtons[index];
+    wxImage colour(152 * scale, 58 * scale);
+    colour.SetRGB(wxRect(colour.GetSize()), 224, 223, 227);
+    const wxBitmap icon = LoadPicture(wxString("Veltro2AppFrame::") + button.icon, scale);
+    const wxBitmap label =
+        DrawTextToBitmap(wxSize(152, 58), wxPoint(48 + 16, 29), view->GetFont(),
+                         FindModule(button.module)->buttonLabel, view->GetForegroundColour(),
+                         wxALIGN_CENTER_VERTICAL, 0, scale);
+    const wxBitmap back(colour, wxBITMAP_SCREEN_DEPTH, scale);
+    return CompositeBitmap(CompositeBitmap(back, icon, wxPoint(6, 2)), label).ConvertToImage();
 }
 
 // Rows and columns of ink (pixels far from the button's colour) in a label.
@@ -88,6 +116,7 @@ TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
         runs.push_back(std::make_unique<ProbeRun>(install.Path(), Args{},
                                                   EnvList{{"XDG_RUNTIME_DIR", runtime},
                                                           {"DISPLAY", servers.back()->Display()},
+                                                          {"LC_ALL", "C.UTF-8"},
                                                           {"GDK_SCALE", c.scale},
                                                           {"GDK_DPI_SCALE", c.textScale}}));
     }
@@ -143,41 +172,58 @@ TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
         const double scale = std::stod(cases[i].scale);
         views[i] = shot(i, "Veltrona", [&](const wxImage& image) {
             return image.GetSize() == wxSize(564, 344) * scale &&
-                   !LabelInk(image, kButtons[5], scale).IsEmpty();
+                   !LabelInk(image, kButtons[5].at, scale).IsEmpty();
         });
         // Every label at one size: the same baseline, and each within its button.
-        const wxRect first = LabelInk(views[i], kButtons[0], scale);
-        for (const wxPoint& button : kButtons) {
-            const wxRect ink = LabelInk(views[i], button, scale);
-            EXPECT_LE(ink.GetRight(), (button.x + 152 - 2) * scale) << button.x << "," << button.y;
-            if (&button - kButtons < 4) {
-                EXPECT_EQ(ink.GetBottom() - button.y * scale, first.GetBottom() - 68 * scale)
-                    << button.x << "," << button.y;
+        const wxRect first = LabelInk(views[i], kButtons[0].at, scale);
+        for (int b = 0; b < 6; ++b) {
+            const wxPoint& at = kButtons[b].at;
+            const wxRect ink = LabelInk(views[i], at, scale);
+            EXPECT_LE(ink.GetRight(), (at.x + 152 - 2) * scale) << kButtons[b].icon;
+            if (b < 4) {
+                EXPECT_EQ(ink.GetBottom() - at.y * scale, first.GetBottom() - 68 * scale)
+                    << kButtons[b].icon;
             }
         }
     }
 
     // The titles stay above their columns however large the text.
     const wxImage art = LoadPicture("Veltro2AppFrame::LauncherBG", 1).ConvertToImage();
+    int inkPastColumn = 0;
     for (int y = 15; y < 50; ++y)
         for (int x = 557; x < 564; ++x)
-            EXPECT_LT(Distance(views[4], x, y, art, x, y), 150) << x << "," << y;
+            inkPastColumn += Distance(views[4], x, y, art, x, y) > 150;
+    EXPECT_EQ(inkPastColumn, 0) << "\"Evaluate Profile\" runs past its column";
 
-    // At 200% the pictures are their 2x renderings, the labels drawn at that resolution.
-    const auto [viewToDoubled, viewToScaled] =
-        FromDoubledAndScaled(views[3], "Veltro2AppFrame::LauncherBG", wxRect(10, 10, 190, 290));
-    EXPECT_LT(viewToScaled * 4, viewToDoubled);
-    const auto [splashToDoubled, splashToScaled] =
-        FromDoubledAndScaled(splash, "Veltro2AppFrame::SplashMainApp", wxRect(0, 0, 445, 300));
-    EXPECT_LT(splashToScaled * 4, splashToDoubled);
-    for (const wxPoint& button : kButtons) {
-        const wxRect ink = LabelInk(views[3], button, 2);
-        int unlike = 0;
-        for (int y = ink.y & ~1; y < ink.GetBottom(); y += 2)
-            for (int x = ink.x & ~1; x < ink.GetRight(); x += 2)
-                unlike += Distance(views[3], x, y, views[3], x + 1, y + 1) > 30;
-        EXPECT_GT(unlike, 20) << "label at " << button.x << "," << button.y << " is doubled";
-    }
+    // At 200% the pictures are their 2x renderings, the labels drawn at that resolution:
+    // each is far closer to the launcher's 2x rendering than to its 1x one doubled.
+    auto expectScaled = [](const std::pair<long, long>& distances, const std::string& what) {
+        EXPECT_LT(distances.second * 4, distances.first) << what << " is a doubled 1x one";
+    };
+    const wxRect left(10, 10, 190, 290);
+    expectScaled(
+        FromDoubledAndScaled(views[3], left.GetPosition(), art.GetSubImage(left),
+                             LoadPicture("Veltro2AppFrame::LauncherBG", 2)
+                                 .ConvertToImage()
+                                 .GetSubImage(wxRect(left.GetPosition() * 2, left.GetSize() * 2))),
+        "the view's picture");
+    const wxRect upper(0, 0, 445, 300);
+    expectScaled(
+        FromDoubledAndScaled(
+            splash, upper.GetPosition(),
+            LoadPicture("Veltro2AppFrame::SplashMainApp", 1).ConvertToImage().GetSubImage(upper),
+            LoadPicture("Veltro2AppFrame::SplashMainApp", 2)
+                .ConvertToImage()
+                .GetSubImage(wxRect(upper.GetPosition() * 2, upper.GetSize() * 2))),
+        "the splash picture");
+    auto* frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
+    for (int b = 0; b < 6; ++b)
+        if (b != 1)
+            expectScaled(FromDoubledAndScaled(views[3], kButtons[b].at,
+                                              ButtonAt(frame->GetStandardView(), b, 1),
+                                              ButtonAt(frame->GetStandardView(), b, 2)),
+                         kButtons[b].icon);
+    frame->Destroy();
 }
 
 // Found through PATH, through a link elsewhere, or by its path: the launcher
