@@ -20,6 +20,7 @@
 #include <memory>
 #include <set>
 #include <sys/wait.h>
+#include <tuple>
 
 namespace {
 
@@ -200,22 +201,17 @@ TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
     auto expectScaled = [](const std::pair<long, long>& distances, const std::string& what) {
         EXPECT_LT(distances.second * 4, distances.first) << what << " is a doubled 1x one";
     };
-    const wxRect left(10, 10, 190, 290);
-    expectScaled(
-        FromDoubledAndScaled(views[3], left.GetPosition(), art.GetSubImage(left),
-                             LoadPicture("Veltro2AppFrame::LauncherBG", 2)
-                                 .ConvertToImage()
-                                 .GetSubImage(wxRect(left.GetPosition() * 2, left.GetSize() * 2))),
-        "the view's picture");
-    const wxRect upper(0, 0, 445, 300);
-    expectScaled(
-        FromDoubledAndScaled(
-            splash, upper.GetPosition(),
-            LoadPicture("Veltro2AppFrame::SplashMainApp", 1).ConvertToImage().GetSubImage(upper),
-            LoadPicture("Veltro2AppFrame::SplashMainApp", 2)
-                .ConvertToImage()
-                .GetSubImage(wxRect(upper.GetPosition() * 2, upper.GetSize() * 2))),
-        "the splash picture");
+    auto picture = [](const char* name, double scale, const wxRect& area) {
+        return LoadPicture(wxString("Veltro2AppFrame::") + name, scale)
+            .ConvertToImage()
+            .GetSubImage(wxRect(area.GetPosition() * scale, area.GetSize() * scale));
+    };
+    for (const auto& [shown, name, area] :
+         {std::make_tuple(views[3], "LauncherBG", wxRect(10, 10, 190, 290)),
+          std::make_tuple(splash, "SplashMainApp", wxRect(0, 0, 445, 300))})
+        expectScaled(FromDoubledAndScaled(shown, area.GetPosition(), picture(name, 1, area),
+                                          picture(name, 2, area)),
+                     name);
     auto* frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
     for (int b = 0; b < 6; ++b)
         if (b != 1)
