@@ -45,10 +45,10 @@ void CloseWindow(unsigned long window)
     std::system(("wmctrl -i -c " + std::to_string(window)).c_str());
 }
 
-wxImage ScreenPixels(const wxRect& rect)
+wxImage ScreenPixels(const wxRect& rect, const std::string& displayName)
 {
     wxImage pixels(rect.width, rect.height);
-    Display* display = XOpenDisplay(nullptr);
+    Display* display = XOpenDisplay(displayName.empty() ? nullptr : displayName.c_str());
     if (!display)
         return pixels;
     XImage* image = XGetImage(display, DefaultRootWindow(display), rect.x, rect.y, rect.width,

@@ -18,8 +18,8 @@ class wxImage;
 class wxRect;
 class wxSize;
 
-// What the screen shows in a rectangle given in screen coordinates.
-wxImage ScreenPixels(const wxRect& rect);
+// What the screen shows in a rectangle of its pixels, on the test's display or another.
+wxImage ScreenPixels(const wxRect& rect, const std::string& display = "");
 
 // The size of the window itself, without the window manager's frame; (0, 0) if none.
 wxSize WindowSize(unsigned long window);

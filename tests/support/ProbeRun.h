@@ -9,8 +9,9 @@
 
 struct ProbeEvent
 {
-    std::string kind;                // "dialog" or "shown"
-    std::vector<std::string> fields; // dialog: message, caption, style; shown: title, ms
+    std::string kind;                // "dialog", "shown" or "placed"
+    std::vector<std::string> fields; // dialog: message, caption, style; shown: title, ms;
+                                     // placed: title, x, y, width, height
 };
 
 // Every line of a log of tab-separated, escaped fields, the first being the kind

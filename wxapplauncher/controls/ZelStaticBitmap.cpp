@@ -202,7 +202,7 @@ wxSize ZelStaticBitmap::DoGetBestSize() const
     wxSize best(0, 0);
     for (const wxBitmap* b : {&m_bitmap, &m_bitmapDisabled, &m_bitmapHover, &m_bitmapPressed})
         if (b->IsOk())
-            best.IncTo(b->GetSize());
+            best.IncTo(b->GetLogicalSize());
     if (m_framed)
         best += wxSize(4, 6);
     return best;
@@ -284,8 +284,12 @@ void ZelStaticBitmap::OnPaint(wxPaintEvent&)
     const wxSize size = GetClientSize();
     if (size.x <= 0 || size.y <= 0)
         return;
-    if (!m_backBuffer || !m_backBuffer->IsOk() || m_backBuffer->GetSize() != size) {
-        m_backBuffer = std::make_unique<wxBitmap>(size.x, size.y);
+    // Of the display's physical pixels, so that a scaled display shows the images' own.
+    const double scale = GetContentScaleFactor();
+    if (!m_backBuffer || !m_backBuffer->IsOk() || m_backBuffer->GetLogicalSize() != size ||
+        m_backBuffer->GetScaleFactor() != scale) {
+        m_backBuffer = std::make_unique<wxBitmap>();
+        m_backBuffer->CreateWithDIPSize(size, scale);
         m_dirty = true;
     }
     if (m_dirty) {
@@ -352,9 +356,10 @@ void ZelStaticBitmap::Render(wxDC& dc, int w, int h)
         DrawFrameFill(dc, w, h, top, bottom);
     }
 
-    if (image->IsOk() && image->GetWidth() > 0 && image->GetHeight() > 0) {
+    const wxSize imageSize = image->IsOk() ? image->GetLogicalSize() : wxSize();
+    if (imageSize.x > 0 && imageSize.y > 0) {
         if (m_centred)
-            dc.DrawBitmap(*image, (w - image->GetWidth()) / 2, (h - image->GetHeight()) / 2, true);
+            dc.DrawBitmap(*image, (w - imageSize.x) / 2, (h - imageSize.y) / 2, true);
         else
             dc.DrawBitmap(*image, 2, 3, true);
     }
@@ -455,5 +460,5 @@ wxBitmap MakeDisabledBitmap(const wxBitmap& bitmap, const wxColour& colour, doub
         std::copy(source.GetAlpha(), source.GetAlpha() + static_cast<long>(w) * h,
                   result.GetAlpha());
     }
-    return wxBitmap(result);
+    return wxBitmap(result, wxBITMAP_SCREEN_DEPTH, bitmap.GetScaleFactor());
 }

@@ -5,6 +5,7 @@
 
 #include <wx/bitmap.h>
 #include <wx/colour.h>
+#include <wx/font.h>
 #include <wx/panel.h>
 
 class Veltro3MainAppDialogController : public wxPanel
@@ -33,6 +34,7 @@ protected:
 private:
     wxBitmap m_backBuffer;
     wxBitmap m_background;
+    wxFont m_titleFont;
     wxColour m_viewColour;
     bool m_dirty = true;
 
