@@ -30,6 +30,11 @@ packages=(
     libtsan2
     dpkg-dev
     file
+    fonts-wqy-microhei
+    at-spi2-core
+    libatspi2.0-dev
+    dbus
+    dbus-bin
     lintian
     desktop-file-utils
     appstream
@@ -38,6 +43,11 @@ packages=(
     shared-mime-info
     xdg-utils
     file
+    fonts-wqy-microhei
+    at-spi2-core
+    libatspi2.0-dev
+    dbus
+    dbus-bin
 )
 
 missing=()

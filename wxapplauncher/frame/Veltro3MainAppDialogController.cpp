@@ -1,6 +1,7 @@
 #include "frame/Veltro3MainAppDialogController.h"
 
 #include "controls/TextBitmap.h"
+#include "platform/KeyboardFocus.h"
 
 #include <wx/dcclient.h>
 #include <wx/dcmemory.h>
@@ -59,6 +60,12 @@ void Veltro3MainAppDialogController::Refresh(bool eraseBackground, const wxRect*
 {
     m_dirty = true;
     wxPanel::Refresh(eraseBackground, rect);
+}
+
+void Veltro3MainAppDialogController::GTKHandleRealized()
+{
+    wxPanel::GTKHandleRealized();
+    DropInputMethod(this);
 }
 
 wxSize Veltro3MainAppDialogController::DoGetBestSize() const
