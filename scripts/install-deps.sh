@@ -43,11 +43,6 @@ packages=(
     shared-mime-info
     xdg-utils
     file
-    fonts-wqy-microhei
-    at-spi2-core
-    libatspi2.0-dev
-    dbus
-    dbus-bin
 )
 
 missing=()
