@@ -1,0 +1,176 @@
+// The real launcher as a keyboard user, a screen reader and an input method
+// see it: button names and click actions over AT-SPI, Tab, Space and Return
+// through XTest, and the view's pixels under GTK's input methods.
+#include "support/DesktopTools.h"
+#include "support/GuiWait.h"
+#include "support/ProbeRun.h"
+#include "support/SessionBus.h"
+#include "support/StandinDir.h"
+#include "support/StandinLog.h"
+
+#include <atspi/atspi.h>
+#include <gtest/gtest.h>
+#include <wx/image.h>
+
+#include <algorithm>
+#include <cstdlib>
+
+namespace {
+
+// In reading order, as the buttons are.
+const std::vector<std::string> kModules = {
+    "Quenta Print Studio.exe",   "Monitor/Zel Display Studio.exe", "Quenta Link Studio.exe",
+    "Quenta Inspect Studio.exe", "Quenta Edit Studio.exe",         "ZelVerifyStudio.exe"};
+
+struct Button
+{
+    std::string name;
+    bool focused;
+    AtspiAccessible* accessible; // one reference held
+};
+
+void Collect(AtspiAccessible* node, std::vector<Button>& buttons)
+{
+    if (atspi_accessible_get_role(node, nullptr) == ATSPI_ROLE_PUSH_BUTTON) {
+        gchar* name = atspi_accessible_get_name(node, nullptr);
+        AtspiStateSet* states = atspi_accessible_get_state_set(node);
+        buttons.push_back({name ? name : "",
+                           atspi_state_set_contains(states, ATSPI_STATE_FOCUSED) ? true : false,
+                           ATSPI_ACCESSIBLE(g_object_ref(node))});
+        g_free(name);
+        g_object_unref(states);
+    }
+    for (int i = 0, n = atspi_accessible_get_child_count(node, nullptr); i < n; ++i)
+        if (AtspiAccessible* child = atspi_accessible_get_child_at_index(node, i, nullptr)) {
+            Collect(child, buttons);
+            g_object_unref(child);
+        }
+}
+
+// The push buttons of process `pid`'s accessible tree, read afresh.
+std::vector<Button> Buttons(pid_t pid)
+{
+    std::vector<Button> buttons;
+    AtspiAccessible* desktop = atspi_get_desktop(0);
+    for (int i = 0, n = atspi_accessible_get_child_count(desktop, nullptr); i < n; ++i)
+        if (AtspiAccessible* app = atspi_accessible_get_child_at_index(desktop, i, nullptr)) {
+            if (atspi_accessible_get_process_id(app, nullptr) == static_cast<guint>(pid)) {
+                atspi_accessible_set_cache_mask(app, ATSPI_CACHE_NONE);
+                Collect(app, buttons);
+            }
+            g_object_unref(app);
+        }
+    g_object_unref(desktop);
+    return buttons;
+}
+
+void Release(std::vector<Button>& buttons)
+{
+    for (Button& b : buttons)
+        g_object_unref(b.accessible);
+    buttons.clear();
+}
+
+std::string Focused(pid_t pid)
+{
+    std::vector<Button> buttons = Buttons(pid);
+    std::string name;
+    for (const Button& b : buttons)
+        if (b.focused)
+            name = b.name;
+    Release(buttons);
+    return name;
+}
+
+unsigned long LauncherWindow(const ProbeRun& run)
+{
+    unsigned long window = 0;
+    WaitFor([&] { return (window = WindowOf(run.Pid(), "Veltrona")) != 0; });
+    return window;
+}
+
+TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
+{
+    SessionBus bus;
+    ASSERT_FALSE(bus.Address().empty());
+    atspi_init();
+    StandinDir install(kModules);
+    const std::string log = install.Path() + "/starts.log";
+    setenv("VELTRONA_STANDIN_LOG", log.c_str(), 1);
+    setenv("VELTRONA_STANDIN_EXIT", "1", 1);
+    auto expectStarted = [&](size_t count, size_t module) {
+        const auto records = WaitForRecords(log, count);
+        ASSERT_EQ(records.size(), count) << kModules[module];
+        EXPECT_EQ(records.back().exe, install.Path() + "/" + kModules[module]);
+    };
+
+    const struct
+    {
+        const char* lang;
+        std::vector<std::string> names; // reading order, Help last
+    } languages[] = {
+        {"en_US.UTF-8", {"Printer", "Monitor", "Device Link", "Inspect", "Edit", "Verify", "Help"}},
+        {"de_DE.UTF-8",
+         {"Drucker", "Monitor", "Device Link", "Untersuchen", "Bearbeiten", "Verifizieren",
+          "Hilfe"}},
+    };
+    size_t started = 0;
+    for (const auto& [lang, names] : languages) {
+        ProbeRun run(install.Path(), {}, {{"LANG", lang}});
+        ASSERT_TRUE(run.WaitForShown()) << lang;
+        std::vector<Button> buttons;
+        ASSERT_TRUE(WaitFor([&] {
+            Release(buttons);
+            buttons = Buttons(run.Pid());
+            return buttons.size() == names.size();
+        })) << lang;
+        std::vector<std::string> found;
+        for (const Button& b : buttons)
+            found.push_back(b.name);
+        EXPECT_TRUE(std::is_permutation(found.begin(), found.end(), names.begin(), names.end()))
+            << lang << ": " << ::testing::PrintToString(found);
+
+        // A screen reader's click on Inspect starts the module.
+        const auto inspect = std::find(found.begin(), found.end(), names[3]);
+        ASSERT_NE(inspect, found.end()) << lang;
+        AtspiAction* action =
+            atspi_accessible_get_action_iface(buttons[inspect - found.begin()].accessible);
+        ASSERT_TRUE(action);
+        gchar* actionName = atspi_action_get_action_name(action, 0, nullptr);
+        EXPECT_STREQ(actionName, "click");
+        g_free(actionName);
+        EXPECT_TRUE(atspi_action_do_action(action, 0, nullptr));
+        g_object_unref(action);
+        Release(buttons);
+        expectStarted(++started, 3);
+
+        // Tab walks the buttons in reading order, round and round.
+        const unsigned long window = LauncherWindow(run);
+        ASSERT_NE(window, 0u);
+        std::string focused = Focused(run.Pid());
+        auto tab = [&] {
+            const std::string before = focused;
+            TypeKeys(window, "Tab");
+            WaitFor([&] { return (focused = Focused(run.Pid())) != before && !focused.empty(); });
+            return focused;
+        };
+        std::vector<std::string> order;
+        for (size_t i = 0; i < names.size(); ++i)
+            order.push_back(tab());
+        const auto first = std::find(order.begin(), order.end(), names[0]);
+        ASSERT_NE(first, order.end()) << lang << ": " << ::testing::PrintToString(order);
+        std::rotate(order.begin(), first, order.end());
+        EXPECT_EQ(order, names) << lang;
+
+        // Space presses the focused Printer button, Return the next one, Monitor.
+        for (size_t i = 0; i < names.size() && focused != names[0]; ++i)
+            tab();
+        TypeKeys(window, "space");
+        expectStarted(++started, 0);
+        TypeKeys(window, "Tab Return");
+        expectStarted(++started, 1);
+    }
+    EXPECT_EQ(SettledRecords(log).size(), started);
+}
+
+} // namespace
