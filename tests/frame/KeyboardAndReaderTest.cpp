@@ -173,4 +173,60 @@ TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
     EXPECT_EQ(SettledRecords(log).size(), started);
 }
 
+// What the screen shows of the view (the client area below the menu bar) once
+// it has stopped changing and is more than one colour.
+wxImage SettledView(unsigned long window)
+{
+    const wxRect client = WindowRect(window);
+    const wxRect view(client.x, client.GetBottom() - 343, 564, 344);
+    wxImage last;
+    int same = 0;
+    WaitFor([&] {
+        const wxImage now = ScreenPixels(view);
+        same = last.IsOk() && SamePixels(now, last, 0) ? same + 1 : 0;
+        last = now;
+        const unsigned char* p = now.GetData();
+        return same >= 5 && std::any_of(p, p + 3L * now.GetWidth() * now.GetHeight(),
+                                        [p](unsigned char c) { return c != p[0]; });
+    });
+    return last;
+}
+
+TEST(KeyboardAndReaderTest, ViewPaintsUnderEveryInputMethod)
+{
+    StandinDir install(kModules);
+    // GTK's X input method works without an input method server: Xlib then
+    // opens its local one, and GTK still asks for the focused window's X window.
+    const struct
+    {
+        const char* lang;
+        const char* inputMethod;
+    } cases[] = {{"en_US.UTF-8", "simple"},
+                 {"ja_JP.UTF-8", "simple"},
+                 {"ja_JP.UTF-8", "xim"},
+                 {"zh_CN.UTF-8", "simple"},
+                 {"zh_CN.UTF-8", "xim"}};
+    // The launcher picture left of the buttons, the same in every language.
+    const wxRect picture(0, 2, 200, 290);
+    wxImage english, simple;
+    std::system("xdotool mousemove 0 0");
+    for (const auto& [lang, inputMethod] : cases) {
+        ProbeRun run(install.Path(), {}, {{"LANG", lang}, {"GTK_IM_MODULE", inputMethod}});
+        ASSERT_TRUE(run.WaitForShown()) << lang;
+        const unsigned long window = LauncherWindow(run);
+        ASSERT_NE(window, 0u);
+        // A focused button, as after the first Tab.
+        TypeKeys(window, "Tab");
+        const wxImage view = SettledView(window);
+        if (!english.IsOk())
+            english = view;
+        EXPECT_TRUE(SamePixels(view.GetSubImage(picture), english.GetSubImage(picture)))
+            << lang << " " << inputMethod;
+        if (std::string(inputMethod) == "simple")
+            simple = view;
+        else
+            EXPECT_TRUE(SamePixels(view, simple)) << lang << " " << inputMethod;
+    }
+}
+
 } // namespace
