@@ -14,6 +14,8 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <functional>
+#include <memory>
 
 namespace {
 
@@ -26,60 +28,47 @@ struct Button
 {
     std::string name;
     bool focused;
-    AtspiAccessible* accessible; // one reference held
+    std::shared_ptr<AtspiAccessible> accessible;
 };
 
-void Collect(AtspiAccessible* node, std::vector<Button>& buttons)
-{
-    if (atspi_accessible_get_role(node, nullptr) == ATSPI_ROLE_PUSH_BUTTON) {
-        gchar* name = atspi_accessible_get_name(node, nullptr);
-        AtspiStateSet* states = atspi_accessible_get_state_set(node);
-        buttons.push_back({name ? name : "",
-                           atspi_state_set_contains(states, ATSPI_STATE_FOCUSED) ? true : false,
-                           ATSPI_ACCESSIBLE(g_object_ref(node))});
-        g_free(name);
-        g_object_unref(states);
-    }
-    for (int i = 0, n = atspi_accessible_get_child_count(node, nullptr); i < n; ++i)
-        if (AtspiAccessible* child = atspi_accessible_get_child_at_index(node, i, nullptr)) {
-            Collect(child, buttons);
-            g_object_unref(child);
-        }
-}
-
-// The push buttons of process `pid`'s accessible tree, read afresh.
+// The push buttons in process `pid`'s accessible tree, read afresh.
 std::vector<Button> Buttons(pid_t pid)
 {
     std::vector<Button> buttons;
-    AtspiAccessible* desktop = atspi_get_desktop(0);
-    for (int i = 0, n = atspi_accessible_get_child_count(desktop, nullptr); i < n; ++i)
-        if (AtspiAccessible* app = atspi_accessible_get_child_at_index(desktop, i, nullptr)) {
-            if (atspi_accessible_get_process_id(app, nullptr) == static_cast<guint>(pid)) {
-                atspi_accessible_set_cache_mask(app, ATSPI_CACHE_NONE);
-                Collect(app, buttons);
-            }
-            g_object_unref(app);
+    auto own = [](AtspiAccessible* a) {
+        return std::shared_ptr<AtspiAccessible>(a, g_object_unref);
+    };
+    std::function<void(const std::shared_ptr<AtspiAccessible>&)> walk = [&](const auto& node) {
+        if (atspi_accessible_get_role(node.get(), nullptr) == ATSPI_ROLE_PUSH_BUTTON) {
+            std::unique_ptr<gchar, void (*)(gpointer)> name(
+                atspi_accessible_get_name(node.get(), nullptr), g_free);
+            std::unique_ptr<AtspiStateSet, void (*)(gpointer)> states(
+                atspi_accessible_get_state_set(node.get()), g_object_unref);
+            buttons.push_back({name ? name.get() : "",
+                               atspi_state_set_contains(states.get(), ATSPI_STATE_FOCUSED) != 0,
+                               node});
         }
-    g_object_unref(desktop);
+        for (int i = 0, n = atspi_accessible_get_child_count(node.get(), nullptr); i < n; ++i)
+            if (auto child = own(atspi_accessible_get_child_at_index(node.get(), i, nullptr)))
+                walk(child);
+    };
+    const auto desktop = own(atspi_get_desktop(0));
+    for (int i = 0, n = atspi_accessible_get_child_count(desktop.get(), nullptr); i < n; ++i) {
+        const auto app = own(atspi_accessible_get_child_at_index(desktop.get(), i, nullptr));
+        if (app && atspi_accessible_get_process_id(app.get(), nullptr) == guint(pid)) {
+            atspi_accessible_set_cache_mask(app.get(), ATSPI_CACHE_NONE);
+            walk(app);
+        }
+    }
     return buttons;
-}
-
-void Release(std::vector<Button>& buttons)
-{
-    for (Button& b : buttons)
-        g_object_unref(b.accessible);
-    buttons.clear();
 }
 
 std::string Focused(pid_t pid)
 {
-    std::vector<Button> buttons = Buttons(pid);
-    std::string name;
-    for (const Button& b : buttons)
+    for (const Button& b : Buttons(pid))
         if (b.focused)
-            name = b.name;
-    Release(buttons);
-    return name;
+            return b.name;
+    return {};
 }
 
 unsigned long LauncherWindow(const ProbeRun& run)
@@ -98,55 +87,43 @@ TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
     const std::string log = install.Path() + "/starts.log";
     setenv("VELTRONA_STANDIN_LOG", log.c_str(), 1);
     setenv("VELTRONA_STANDIN_EXIT", "1", 1);
-    auto expectStarted = [&](size_t count, size_t module) {
-        const auto records = WaitForRecords(log, count);
-        ASSERT_EQ(records.size(), count) << kModules[module];
+    size_t started = 0;
+    auto expectStarted = [&](size_t module) {
+        const auto records = WaitForRecords(log, ++started);
+        ASSERT_EQ(records.size(), started) << kModules[module];
         EXPECT_EQ(records.back().exe, install.Path() + "/" + kModules[module]);
     };
 
-    const struct
-    {
-        const char* lang;
-        std::vector<std::string> names; // reading order, Help last
-    } languages[] = {
+    const std::pair<const char*, std::vector<std::string>> languages[] = {
         {"en_US.UTF-8", {"Printer", "Monitor", "Device Link", "Inspect", "Edit", "Verify", "Help"}},
         {"de_DE.UTF-8",
          {"Drucker", "Monitor", "Device Link", "Untersuchen", "Bearbeiten", "Verifizieren",
-          "Hilfe"}},
-    };
-    size_t started = 0;
+          "Hilfe"}}};
     for (const auto& [lang, names] : languages) {
         ProbeRun run(install.Path(), {}, {{"LANG", lang}});
         ASSERT_TRUE(run.WaitForShown()) << lang;
         std::vector<Button> buttons;
-        ASSERT_TRUE(WaitFor([&] {
-            Release(buttons);
-            buttons = Buttons(run.Pid());
-            return buttons.size() == names.size();
-        })) << lang;
         std::vector<std::string> found;
+        WaitFor([&] { return (buttons = Buttons(run.Pid())).size() == names.size(); });
         for (const Button& b : buttons)
             found.push_back(b.name);
-        EXPECT_TRUE(std::is_permutation(found.begin(), found.end(), names.begin(), names.end()))
+        ASSERT_TRUE(std::is_permutation(found.begin(), found.end(), names.begin(), names.end()))
             << lang << ": " << ::testing::PrintToString(found);
 
         // A screen reader's click on Inspect starts the module.
-        const auto inspect = std::find(found.begin(), found.end(), names[3]);
-        ASSERT_NE(inspect, found.end()) << lang;
-        AtspiAction* action =
-            atspi_accessible_get_action_iface(buttons[inspect - found.begin()].accessible);
+        const Button& inspect =
+            buttons[std::find(found.begin(), found.end(), names[3]) - found.begin()];
+        std::unique_ptr<AtspiAction, void (*)(gpointer)> action(
+            atspi_accessible_get_action_iface(inspect.accessible.get()), g_object_unref);
         ASSERT_TRUE(action);
-        gchar* actionName = atspi_action_get_action_name(action, 0, nullptr);
-        EXPECT_STREQ(actionName, "click");
-        g_free(actionName);
-        EXPECT_TRUE(atspi_action_do_action(action, 0, nullptr));
-        g_object_unref(action);
-        Release(buttons);
-        expectStarted(++started, 3);
+        std::unique_ptr<gchar, void (*)(gpointer)> actionName(
+            atspi_action_get_action_name(action.get(), 0, nullptr), g_free);
+        EXPECT_STREQ(actionName.get(), "click");
+        EXPECT_TRUE(atspi_action_do_action(action.get(), 0, nullptr));
+        expectStarted(3);
 
         // Tab walks the buttons in reading order, round and round.
         const unsigned long window = LauncherWindow(run);
-        ASSERT_NE(window, 0u);
         std::string focused = Focused(run.Pid());
         auto tab = [&] {
             const std::string before = focused;
@@ -166,9 +143,9 @@ TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
         for (size_t i = 0; i < names.size() && focused != names[0]; ++i)
             tab();
         TypeKeys(window, "space");
-        expectStarted(++started, 0);
+        expectStarted(0);
         TypeKeys(window, "Tab Return");
-        expectStarted(++started, 1);
+        expectStarted(1);
     }
     EXPECT_EQ(SettledRecords(log).size(), started);
 }
@@ -197,15 +174,11 @@ TEST(KeyboardAndReaderTest, ViewPaintsUnderEveryInputMethod)
     StandinDir install(kModules);
     // GTK's X input method works without an input method server: Xlib then
     // opens its local one, and GTK still asks for the focused window's X window.
-    const struct
-    {
-        const char* lang;
-        const char* inputMethod;
-    } cases[] = {{"en_US.UTF-8", "simple"},
-                 {"ja_JP.UTF-8", "simple"},
-                 {"ja_JP.UTF-8", "xim"},
-                 {"zh_CN.UTF-8", "simple"},
-                 {"zh_CN.UTF-8", "xim"}};
+    const std::pair<const char*, std::string> cases[] = {{"en_US.UTF-8", "simple"},
+                                                         {"ja_JP.UTF-8", "simple"},
+                                                         {"ja_JP.UTF-8", "xim"},
+                                                         {"zh_CN.UTF-8", "simple"},
+                                                         {"zh_CN.UTF-8", "xim"}};
     // The launcher picture left of the buttons, the same in every language.
     const wxRect picture(0, 2, 200, 290);
     wxImage english, simple;
@@ -214,7 +187,6 @@ TEST(KeyboardAndReaderTest, ViewPaintsUnderEveryInputMethod)
         ProbeRun run(install.Path(), {}, {{"LANG", lang}, {"GTK_IM_MODULE", inputMethod}});
         ASSERT_TRUE(run.WaitForShown()) << lang;
         const unsigned long window = LauncherWindow(run);
-        ASSERT_NE(window, 0u);
         // A focused button, as after the first Tab.
         TypeKeys(window, "Tab");
         const wxImage view = SettledView(window);
@@ -222,7 +194,7 @@ TEST(KeyboardAndReaderTest, ViewPaintsUnderEveryInputMethod)
             english = view;
         EXPECT_TRUE(SamePixels(view.GetSubImage(picture), english.GetSubImage(picture)))
             << lang << " " << inputMethod;
-        if (std::string(inputMethod) == "simple")
+        if (inputMethod == "simple")
             simple = view;
         else
             EXPECT_TRUE(SamePixels(view, simple)) << lang << " " << inputMethod;
