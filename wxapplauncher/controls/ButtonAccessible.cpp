@@ -5,6 +5,8 @@
 #include <gtk/gtk-a11y.h>
 #include <gtk/gtk.h>
 
+#include <mutex>
+
 // The toolkit draws every window into a widget of one class of its own, so the
 // accessible type set for that class answers for all of them: as before for
 // any widget that is not an image button.
@@ -15,11 +17,15 @@ const char kNameKey[] = "veltrona-name";
 
 AtkObjectClass* g_parentClass = nullptr;
 
+// The image button behind the accessible; none for an unlabelled one, which
+// is a picture.
 ZelStaticBitmap* ButtonOf(gpointer accessible)
 {
     GtkWidget* widget = gtk_accessible_get_widget(GTK_ACCESSIBLE(accessible));
-    return widget ? static_cast<ZelStaticBitmap*>(g_object_get_data(G_OBJECT(widget), kButtonKey))
-                  : nullptr;
+    auto* button =
+        widget ? static_cast<ZelStaticBitmap*>(g_object_get_data(G_OBJECT(widget), kButtonKey))
+               : nullptr;
+    return button && !button->GetLabel().empty() ? button : nullptr;
 }
 
 const gchar* GetName(AtkObject* accessible)
@@ -84,17 +90,14 @@ void InitClass(gpointer klass, gpointer)
     atk->ref_state_set = RefStateSet;
 }
 
-GType ButtonAccessibleType()
+GType RegisterButtonAccessible()
 {
-    static const GType type = [] {
-        const GType t = g_type_register_static_simple(
-            GTK_TYPE_CONTAINER_ACCESSIBLE, "VeltronaImageButtonAccessible",
-            sizeof(GtkContainerAccessibleClass), InitClass, sizeof(GtkContainerAccessible), nullptr,
-            GTypeFlags(0));
-        const GInterfaceInfo action = {InitAction, nullptr, nullptr};
-        g_type_add_interface_static(t, ATK_TYPE_ACTION, &action);
-        return t;
-    }();
+    const GType type = g_type_register_static_simple(
+        GTK_TYPE_CONTAINER_ACCESSIBLE, "VeltronaImageButtonAccessible",
+        sizeof(GtkContainerAccessibleClass), InitClass, sizeof(GtkContainerAccessible), nullptr,
+        GTypeFlags(0));
+    const GInterfaceInfo action = {InitAction, nullptr, nullptr};
+    g_type_add_interface_static(type, ATK_TYPE_ACTION, &action);
     return type;
 }
 
@@ -103,11 +106,11 @@ GType ButtonAccessibleType()
 void ExposeAsButton(ZelStaticBitmap* button)
 {
     GtkWidget* widget = button->GetHandle();
-    static const bool typeSet = [widget] {
-        gtk_widget_class_set_accessible_type(GTK_WIDGET_GET_CLASS(widget), ButtonAccessibleType());
-        return true;
-    }();
-    (void)typeSet;
+    static std::once_flag once;
+    std::call_once(once, [widget] {
+        gtk_widget_class_set_accessible_type(GTK_WIDGET_GET_CLASS(widget),
+                                             RegisterButtonAccessible());
+    });
     g_object_set_data(G_OBJECT(widget), kButtonKey, button);
 }
 

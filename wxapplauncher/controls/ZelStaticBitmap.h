@@ -2,9 +2,9 @@
 // images by state (normal, hover, pressed, toggled, disabled), follows the
 // mouse with capture and sends a button-click command event like a native
 // button. It takes the keyboard focus (Space and Return click it, a mark
-// shows the focus once the keyboard is used) and answers screen readers as a
-// push button named by its label; an optional framed look draws a rounded
-// bevel behind the image.
+// shows the focus once the keyboard is used) and, given a label, answers
+// screen readers as a push button named by it; an optional framed look draws
+// a rounded bevel behind the image.
 #pragma once
 
 #include <wx/bitmap.h>
