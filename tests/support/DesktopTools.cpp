@@ -5,6 +5,7 @@
 #include <X11/Xlib.h>
 #include <X11/Xutil.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 
@@ -86,6 +87,13 @@ wxSize WindowSize(unsigned long window)
     return size;
 }
 
+bool SamePixels(const wxImage& a, const wxImage& b, int tolerance)
+{
+    return a.GetSize() == b.GetSize() &&
+           std::equal(a.GetData(), a.GetData() + 3L * a.GetWidth() * a.GetHeight(), b.GetData(),
+                      [tolerance](int x, int y) { return std::abs(x - y) <= tolerance; });
+}
+
 void MinimiseWindow(unsigned long window)
 {
     std::system(("xdotool windowminimize " + std::to_string(window)).c_str());
@@ -95,4 +103,27 @@ bool IsMinimised(unsigned long window)
 {
     return Capture("xprop -id " + std::to_string(window) + " WM_STATE 2>/dev/null")
                .find("Iconic") != std::string::npos;
+}
+
+wxRect WindowRect(unsigned long window)
+{
+    wxRect rect;
+    Display* display = XOpenDisplay(nullptr);
+    if (!display)
+        return rect;
+    XWindowAttributes attributes;
+    Window child;
+    if (XGetWindowAttributes(display, window, &attributes) &&
+        XTranslateCoordinates(display, window, DefaultRootWindow(display), 0, 0, &rect.x, &rect.y,
+                              &child))
+        rect.SetSize(wxSize(attributes.width, attributes.height));
+    XCloseDisplay(display);
+    return rect;
+}
+
+void TypeKeys(unsigned long window, const std::string& keys)
+{
+    std::system(
+        ("xdotool windowactivate --sync " + std::to_string(window) + " key --delay 100 " + keys)
+            .c_str());
 }

@@ -24,8 +24,17 @@ wxImage ScreenPixels(const wxRect& rect, const std::string& display = "");
 // The size of the window itself, without the window manager's frame; (0, 0) if none.
 wxSize WindowSize(unsigned long window);
 
+// Whether two pictures of the same size match, each channel within `tolerance`.
+bool SamePixels(const wxImage& a, const wxImage& b, int tolerance = 3);
+
 // Minimises the window as its title bar's button does, through the window manager.
 void MinimiseWindow(unsigned long window);
 
 // True while the window is minimised (its WM_STATE is Iconic).
 bool IsMinimised(unsigned long window);
+
+// Where the window lies on the screen, in root coordinates; empty if it is gone.
+wxRect WindowRect(unsigned long window);
+
+// Activates the window and types `keys` (xdotool key names) through XTest.
+void TypeKeys(unsigned long window, const std::string& keys);

@@ -1,6 +1,7 @@
 #include "frame/Veltro3MainAppDialogController.h"
 
 #include "controls/TextBitmap.h"
+#include "platform/KeyboardFocus.h"
 #include "resources/ImageSets.h"
 
 #include <wx/dcclient.h>
@@ -72,6 +73,12 @@ void Veltro3MainAppDialogController::Refresh(bool eraseBackground, const wxRect*
 {
     m_dirty = true;
     wxPanel::Refresh(eraseBackground, rect);
+}
+
+void Veltro3MainAppDialogController::GTKHandleRealized()
+{
+    wxPanel::GTKHandleRealized();
+    DropInputMethod(this);
 }
 
 wxSize Veltro3MainAppDialogController::DoGetBestSize() const

@@ -25,6 +25,9 @@ public:
     // Every refresh re-renders the back buffer.
     void Refresh(bool eraseBackground = true, const wxRect* rect = nullptr) override;
 
+    // The panel takes no text: it keeps no input method (see DropInputMethod).
+    void GTKHandleRealized() override;
+
 protected:
     wxSize DoGetBestSize() const override;
     void DrawBackground(wxDC& dc);

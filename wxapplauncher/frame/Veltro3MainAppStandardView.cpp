@@ -10,6 +10,7 @@
 #include <wx/app.h>
 #include <wx/frame.h>
 #include <wx/menu.h>
+#include <wx/utils.h>
 
 namespace {
 
@@ -91,6 +92,7 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
         m_buttons[i] = new ZelStaticBitmap(this, module->buttonId, m_images[i].normal,
                                            wxPoint(place.left, rowTops[place.row]), wxDefaultSize,
                                            wxNO_BORDER, "zelStaticBitmap");
+        m_buttons[i]->SetLabel(label);
         m_buttons[i]->SetCursor(hand);
         if (i == MONITOR || i == VERIFY || i == EDIT)
             m_buttons[i]->SetBackgroundColour(GetViewColour());
@@ -103,6 +105,15 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
         new ZelStaticBitmap(this, ID_BUTTON_HELP, Picture("Help"), wxPoint(10, GetSize().y - 40),
                             wxDefaultSize, ZSB_FRAMED, "zelStaticBitmap");
     m_helpButton->SetBackgroundColour(kHelpButtonColour);
+    m_helpButton->SetLabel(wxStripMenuCodes(_("&Help")));
+
+    // Tab goes down the left column, then the right one, then to Help.
+    ZelStaticBitmap* previous = m_buttons[PRINTER];
+    for (ZelStaticBitmap* next : {m_buttons[MONITOR], m_buttons[DEVICELINK], m_buttons[INSPECT],
+                                  m_buttons[EDIT], m_buttons[VERIFY], m_helpButton}) {
+        next->MoveAfterInTabOrder(previous);
+        previous = next;
+    }
 
     UpdateModuleButtons();
 }
