@@ -32,6 +32,11 @@ packages=(
     libtsan2
     dpkg-dev
     file
+    fonts-wqy-microhei
+    at-spi2-core
+    libatspi2.0-dev
+    dbus
+    dbus-bin
     lintian
     desktop-file-utils
     appstream

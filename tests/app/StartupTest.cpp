@@ -1,4 +1,9 @@
 // Start-up and shutdown of the real launcher, run as its own process.
+#include "controls/TextBitmap.h"
+#include "frame/ModuleCatalog.h"
+#include "frame/Veltro3AppFrame.h"
+#include "frame/Veltro3MainAppStandardView.h"
+#include "resources/ImageSets.h"
 #include "support/DesktopTools.h"
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
@@ -7,36 +12,215 @@
 #include "support/XvfbServer.h"
 
 #include <gtest/gtest.h>
+#include <wx/image.h>
 
 #include <cstdlib>
 #include <filesystem>
+#include <functional>
 #include <memory>
 #include <set>
 #include <sys/wait.h>
+#include <tuple>
 
 namespace {
 
 using Args = std::vector<std::string>;
 
-TEST(StartupTest, ScreenOfAtLeast1024By768IsRequired)
+// The view's buttons: where they lie, their modules and icons. The first four labels have no
+// descenders; the second button lies under the pointer, at the screen's centre.
+const struct
 {
-    StandinDir install({});
-    XvfbServer small(1280, 720), exact(1024, 768);
-    ASSERT_FALSE(small.Display().empty() || exact.Display().empty());
-    ProbeRun refused(install.Path(), {},
-                     {{"XDG_RUNTIME_DIR", install.Path()}, {"DISPLAY", small.Display()}});
-    int status = 0;
-    ASSERT_TRUE(refused.WaitForExit(20000, status));
-    EXPECT_FALSE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
-    const auto events = refused.Events();
-    ASSERT_EQ(events.size(), 1u) << "one message, no window";
-    EXPECT_EQ(events[0].fields[0], "Please set your monitor to a supported resolution.\n"
-                                   "Minimum required: 1024 x 768");
+    wxPoint at;
+    int module;
+    const char* icon;
+} kButtons[] = {
+    {{228, 68}, 1001, "PrinterModule"},     {{228, 155}, 1002, "MonitorModule"},
+    {{228, 237}, 1003, "LinkStudioModule"}, {{405, 155}, 1006, "EditModule"},
+    {{405, 68}, 1005, "InspectorModule"},   {{405, 237}, 1004, "VerifierModule"},
+};
 
-    ProbeRun accepted(install.Path(), {},
-                      {{"XDG_RUNTIME_DIR", install.Path()}, {"DISPLAY", exact.Display()}});
-    EXPECT_TRUE(accepted.WaitForShown());
-    EXPECT_TRUE(accepted.Events("dialog").empty());
+int Distance(const wxImage& a, int ax, int ay, const wxImage& b, int bx, int by)
+{
+    int sum = 0;
+    for (int c = 0; c < 3; ++c)
+        sum += std::abs(a.GetData()[3 * (ay * a.GetWidth() + ax) + c] -
+                        b.GetData()[3 * (by * b.GetWidth() + bx) + c]);
+    return sum;
+}
+
+// How far `shot`, from `at` on, lies from `scaled` and from `normal` doubled, over the
+// pixels opaque in both.
+std::pair<long, long> FromDoubledAndScaled(const wxImage& shot, const wxPoint& at,
+                                           const wxImage& normal, const wxImage& scaled)
+{
+    long toDoubled = 0, toScaled = 0;
+    for (int y = 0; y < scaled.GetHeight(); ++y)
+        for (int x = 0; x < scaled.GetWidth(); ++x)
+            if (scaled.GetAlpha(x, y) == 255 && normal.GetAlpha(x / 2, y / 2) == 255) {
+                toScaled += Distance(shot, 2 * at.x + x, 2 * at.y + y, scaled, x, y);
+                toDoubled += Distance(shot, 2 * at.x + x, 2 * at.y + y, normal, x / 2, y / 2);
+            }
+    return {toDoubled, toScaled};
+}
+
+// A button's normal look over the view's colour, drawn at `scale`: its icon at (6, 2),
+// its label 16 pixels right of the icon, vertically centred.
+wxImage ButtonAt(wxWindow* view, int index, double scale)
+{
+    const auto& button = kButtons[index];
+    wxImage colour(152 * scale, 58 * scale);
+    colour.SetRGB(wxRect(colour.GetSize()), 224, 223, 227);
+    const wxBitmap icon = LoadPicture(wxString("Veltro2AppFrame::") + button.icon, scale);
+    const wxBitmap label =
+        DrawTextToBitmap(wxSize(152, 58), wxPoint(48 + 16, 29), view->GetFont(),
+                         FindModule(button.module)->buttonLabel, view->GetForegroundColour(),
+                         wxALIGN_CENTER_VERTICAL, 0, scale);
+    const wxBitmap back(colour, wxBITMAP_SCREEN_DEPTH, scale);
+    return CompositeBitmap(CompositeBitmap(back, icon, wxPoint(6, 2)), label).ConvertToImage();
+}
+
+// Rows and columns of ink (pixels far from the button's colour) in a label.
+wxRect LabelInk(const wxImage& view, const wxPoint& button, double scale)
+{
+    wxImage colour(1, 1);
+    colour.SetRGB(0, 0, 224, 223, 227);
+    wxRect ink;
+    for (int y = button.y * scale; y < (button.y + 58) * scale; ++y)
+        for (int x = (button.x + 64) * scale; x < (button.x + 152) * scale; ++x)
+            if (Distance(view, x, y, colour, 0, 0) > 150)
+                ink = ink.IsEmpty() ? wxRect(x, y, 1, 1) : ink.Union(wxRect(x, y, 1, 1));
+    return ink;
+}
+
+// The screen check counts the monitor's pixels against the preset and what the windows
+// need at the desktop's scale; the view and the splash are drawn at that scale; large
+// text fits its room.
+TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
+{
+    EnsureLauncherImages();
+    StandinDir install({});
+    const struct
+    {
+        int width, height;
+        const char *scale, *textScale, *refusal;
+    } cases[] = {
+        {1280, 720, "1", "1", "1024 x 768"}, {1024, 768, "2", "1", "1128 x 908"},
+        {1024, 768, "1", "1", nullptr},      {2560, 1440, "2", "1", nullptr},
+        {1024, 768, "1", "1.5", nullptr},
+    };
+    std::vector<std::unique_ptr<XvfbServer>> servers;
+    std::vector<std::unique_ptr<ProbeRun>> runs;
+    for (const auto& c : cases) {
+        servers.push_back(std::make_unique<XvfbServer>(c.width, c.height));
+        ASSERT_FALSE(servers.back()->Display().empty());
+        const std::string runtime = install.Path() + "/run" + std::to_string(runs.size());
+        std::filesystem::create_directory(runtime);
+        runs.push_back(std::make_unique<ProbeRun>(install.Path(), Args{},
+                                                  EnvList{{"XDG_RUNTIME_DIR", runtime},
+                                                          {"DISPLAY", servers.back()->Display()},
+                                                          {"LC_ALL", "C.UTF-8"},
+                                                          {"GDK_SCALE", c.scale},
+                                                          {"GDK_DPI_SCALE", c.textScale}}));
+    }
+    // The shown window's client area on its screen, as the screen shows it once painted
+    // and settled.
+    auto shot = [&](size_t i, const std::string& title,
+                    const std::function<bool(const wxImage&)>& painted) {
+        wxImage image;
+        EXPECT_TRUE(WaitFor([&] {
+            for (const ProbeEvent& e : runs[i]->Events("placed"))
+                if (e.fields[0] == title) {
+                    const wxRect area(std::stoi(e.fields[1]), std::stoi(e.fields[2]),
+                                      std::stoi(e.fields[3]), std::stoi(e.fields[4]));
+                    const wxImage now = ScreenPixels(area, servers[i]->Display());
+                    const bool same =
+                        image.IsOk() && now.GetSize() == image.GetSize() &&
+                        std::equal(now.GetData(), now.GetData() + 3 * area.width * area.height,
+                                   image.GetData());
+                    image = now;
+                    return same && painted(now);
+                }
+            return false;
+        })) << title;
+        return image;
+    };
+    // The start-up splash at 200%, while it shows: its text is drawn last.
+    const wxImage splash = shot(3, "", [](const wxImage& image) {
+        if (image.GetSize() != wxSize(890, 850))
+            return false;
+        for (int x = 0; x < image.GetWidth(); ++x)
+            if (image.GetRed(x, 2 * 346) > 150)
+                return true;
+        return false;
+    });
+    wxImage views[5];
+    for (size_t i = 0; i < runs.size(); ++i) {
+        SCOPED_TRACE(std::to_string(cases[i].width) + " x " + std::to_string(cases[i].height) +
+                     " at " + cases[i].scale + ", text at " + cases[i].textScale);
+        if (cases[i].refusal) {
+            int status = 0;
+            ASSERT_TRUE(runs[i]->WaitForExit(20000, status));
+            EXPECT_FALSE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
+            const auto events = runs[i]->Events();
+            ASSERT_EQ(events.size(), 1u) << "one message, no window";
+            EXPECT_EQ(events[0].fields[0],
+                      std::string("Please set your monitor to a supported resolution.\n"
+                                  "Minimum required: ") +
+                          cases[i].refusal);
+            continue;
+        }
+        ASSERT_TRUE(runs[i]->WaitForShown());
+        EXPECT_TRUE(runs[i]->Events("dialog").empty());
+        const double scale = std::stod(cases[i].scale);
+        views[i] = shot(i, "Veltrona", [&](const wxImage& image) {
+            return image.GetSize() == wxSize(564, 344) * scale &&
+                   !LabelInk(image, kButtons[5].at, scale).IsEmpty();
+        });
+        // Every label at one size: the same baseline, and each within its button.
+        const wxRect first = LabelInk(views[i], kButtons[0].at, scale);
+        for (int b = 0; b < 6; ++b) {
+            const wxPoint& at = kButtons[b].at;
+            const wxRect ink = LabelInk(views[i], at, scale);
+            EXPECT_LE(ink.GetRight(), (at.x + 152 - 2) * scale) << kButtons[b].icon;
+            if (b < 4) {
+                EXPECT_EQ(ink.GetBottom() - at.y * scale, first.GetBottom() - 68 * scale)
+                    << kButtons[b].icon;
+            }
+        }
+    }
+
+    // The titles stay above their columns however large the text.
+    const wxImage art = LoadPicture("Veltro2AppFrame::LauncherBG", 1).ConvertToImage();
+    int inkPastColumn = 0;
+    for (int y = 15; y < 50; ++y)
+        for (int x = 557; x < 564; ++x)
+            inkPastColumn += Distance(views[4], x, y, art, x, y) > 150;
+    EXPECT_EQ(inkPastColumn, 0) << "\"Evaluate Profile\" runs past its column";
+
+    // At 200% the pictures are their 2x renderings, the labels drawn at that resolution:
+    // each is far closer to the launcher's 2x rendering than to its 1x one doubled.
+    auto expectScaled = [](const std::pair<long, long>& distances, const std::string& what) {
+        EXPECT_LT(distances.second * 4, distances.first) << what << " is a doubled 1x one";
+    };
+    auto picture = [](const char* name, double scale, const wxRect& area) {
+        return LoadPicture(wxString("Veltro2AppFrame::") + name, scale)
+            .ConvertToImage()
+            .GetSubImage(wxRect(area.GetPosition() * scale, area.GetSize() * scale));
+    };
+    for (const auto& [shown, name, area] :
+         {std::make_tuple(views[3], "LauncherBG", wxRect(10, 10, 190, 290)),
+          std::make_tuple(splash, "SplashMainApp", wxRect(0, 0, 445, 300))})
+        expectScaled(FromDoubledAndScaled(shown, area.GetPosition(), picture(name, 1, area),
+                                          picture(name, 2, area)),
+                     name);
+    auto* frame = new Veltro3AppFrame("Veltrona", wxDefaultPosition, wxDefaultSize);
+    for (int b = 0; b < 6; ++b)
+        if (b != 1)
+            expectScaled(FromDoubledAndScaled(views[3], kButtons[b].at,
+                                              ButtonAt(frame->GetStandardView(), b, 1),
+                                              ButtonAt(frame->GetStandardView(), b, 2)),
+                         kButtons[b].icon);
+    frame->Destroy();
 }
 
 // Found through PATH, through a link elsewhere, or by its path: the launcher

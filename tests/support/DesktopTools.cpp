@@ -1,11 +1,11 @@
 #include "support/DesktopTools.h"
 
-#include "platform/ScreenCapture.h"
-
 #include <wx/image.h>
 
 #include <X11/Xlib.h>
+#include <X11/Xutil.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 
@@ -46,9 +46,33 @@ void CloseWindow(unsigned long window)
     std::system(("wmctrl -i -c " + std::to_string(window)).c_str());
 }
 
-wxImage ScreenPixels(const wxRect& rect)
+wxImage ScreenPixels(const wxRect& rect, const std::string& displayName)
 {
-    return CaptureScreen(rect);
+    wxImage pixels(rect.width, rect.height);
+    Display* display = XOpenDisplay(displayName.empty() ? nullptr : displayName.c_str());
+    if (!display)
+        return pixels;
+    XImage* image = XGetImage(display, DefaultRootWindow(display), rect.x, rect.y, rect.width,
+                              rect.height, AllPlanes, ZPixmap);
+    if (image) {
+        auto channel = [](unsigned long pixel, unsigned long mask) {
+            int shift = 0;
+            while (mask && !(mask & 1)) {
+                mask >>= 1;
+                ++shift;
+            }
+            return static_cast<unsigned char>(((pixel >> shift) & mask) * 255 / (mask ? mask : 1));
+        };
+        for (int y = 0; y < rect.height; ++y)
+            for (int x = 0; x < rect.width; ++x) {
+                const unsigned long p = XGetPixel(image, x, y);
+                pixels.SetRGB(x, y, channel(p, image->red_mask), channel(p, image->green_mask),
+                              channel(p, image->blue_mask));
+            }
+        XDestroyImage(image);
+    }
+    XCloseDisplay(display);
+    return pixels;
 }
 
 wxSize WindowSize(unsigned long window)
@@ -63,6 +87,13 @@ wxSize WindowSize(unsigned long window)
     return size;
 }
 
+bool SamePixels(const wxImage& a, const wxImage& b, int tolerance)
+{
+    return a.GetSize() == b.GetSize() &&
+           std::equal(a.GetData(), a.GetData() + 3L * a.GetWidth() * a.GetHeight(), b.GetData(),
+                      [tolerance](int x, int y) { return std::abs(x - y) <= tolerance; });
+}
+
 void MinimiseWindow(unsigned long window)
 {
     std::system(("xdotool windowminimize " + std::to_string(window)).c_str());
@@ -72,4 +103,27 @@ bool IsMinimised(unsigned long window)
 {
     return Capture("xprop -id " + std::to_string(window) + " WM_STATE 2>/dev/null")
                .find("Iconic") != std::string::npos;
+}
+
+wxRect WindowRect(unsigned long window)
+{
+    wxRect rect;
+    Display* display = XOpenDisplay(nullptr);
+    if (!display)
+        return rect;
+    XWindowAttributes attributes;
+    Window child;
+    if (XGetWindowAttributes(display, window, &attributes) &&
+        XTranslateCoordinates(display, window, DefaultRootWindow(display), 0, 0, &rect.x, &rect.y,
+                              &child))
+        rect.SetSize(wxSize(attributes.width, attributes.height));
+    XCloseDisplay(display);
+    return rect;
+}
+
+void TypeKeys(unsigned long window, const std::string& keys)
+{
+    std::system(
+        ("xdotool windowactivate --sync " + std::to_string(window) + " key --delay 100 " + keys)
+            .c_str());
 }

@@ -18,5 +18,12 @@ void MinimiseWindow(unsigned long window);
 bool IsMinimised(unsigned long window);
 // The size of the window itself, without the window manager's frame; (0, 0) if none.
 wxSize WindowSize(unsigned long window);
-// What the screen shows in a rectangle given in screen coordinates.
-wxImage ScreenPixels(const wxRect& rect);
+// Where the window lies on the screen, in root coordinates; empty if it is gone.
+wxRect WindowRect(unsigned long window);
+// Activates the window and types `keys` (xdotool key names) through XTest.
+void TypeKeys(unsigned long window, const std::string& keys);
+
+// What the screen shows in a rectangle of its pixels, on the test's display or another.
+wxImage ScreenPixels(const wxRect& rect, const std::string& display = "");
+// Whether two pictures of the same size match, each channel within `tolerance`.
+bool SamePixels(const wxImage& a, const wxImage& b, int tolerance = 3);

@@ -1,7 +1,9 @@
 // The real launcher with two recorders added, for process-level tests: every
 // modal dialog (answered with OK, never shown) and every top-level window that
 // is shown are appended to the file named by VELTRONA_PROBE_LOG (a dialog that
-// is no message box also with the texts of its controls, one per line). With
+// is no message box also with the texts of its controls, one per line); a shown
+// window's client area follows as a "placed" event (title, then x, y, width and
+// height in the screen's physical pixels). With
 // VELTRONA_PROBE_COMMAND=<id>, the menu command <id> goes to the top window
 // once it is first shown, and its start and end are recorded as "command"
 // events (id, then milliseconds since the probe started).
@@ -64,6 +66,15 @@ protected:
         if (event.GetEventType() == wxEVT_SHOW && static_cast<wxShowEvent&>(event).IsShown()) {
             if (auto* window = dynamic_cast<wxTopLevelWindow*>(event.GetEventObject())) {
                 Append("shown\t" + Escape(window->GetTitle()) + "\t" + Elapsed());
+                // Once the toolkit has placed it.
+                window->CallAfter([window] {
+                    const double scale = window->GetContentScaleFactor();
+                    const wxRect area(window->ClientToScreen(wxPoint(0, 0)) * scale,
+                                      window->GetClientSize() * scale);
+                    Append("placed\t" + Escape(window->GetTitle()) + "\t" + std::to_string(area.x) +
+                           "\t" + std::to_string(area.y) + "\t" + std::to_string(area.width) +
+                           "\t" + std::to_string(area.height));
+                });
                 // The main frame, not the start-up splash shown before it.
                 auto* frame = dynamic_cast<wxFrame*>(window);
                 if (frame && frame->GetMenuBar() && window == wxTheApp->GetTopWindow())

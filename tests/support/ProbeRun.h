@@ -9,8 +9,9 @@
 
 struct ProbeEvent
 {
-    std::string kind; // "dialog", "shown" or "command"
-    // dialog: message, caption, style, controls; shown: title, ms; command: id, ms
+    std::string kind; // "dialog", "shown", "placed" or "command"
+    // dialog: message, caption, style, controls; shown: title, ms; placed: title,
+    // x, y, width, height; command: id, ms
     std::vector<std::string> fields;
 };
 

@@ -7,7 +7,6 @@
 #include <wx/dcclient.h>
 #include <wx/frame.h>
 #include <wx/utils.h>
-#include <wx/xrc/xmlres.h>
 
 namespace {
 
@@ -32,10 +31,10 @@ wxBEGIN_EVENT_TABLE(ZelModuleSplashScreen, wxDialog)
 wxEND_EVENT_TABLE()
 // clang-format on
 
-wxBitmap LoadCommonBitmap(const wxString& name)
+wxBitmap LoadCommonBitmap(const wxString& name, double scale)
 {
     EnsureCommonImages();
-    return wxXmlResource::Get()->LoadBitmap(name);
+    return LoadPicture(name, scale);
 }
 
 ZelModuleSplashScreen::ZelModuleSplashScreen(int id, const wxArrayString& lines)
@@ -43,10 +42,10 @@ ZelModuleSplashScreen::ZelModuleSplashScreen(int id, const wxArrayString& lines)
     wxDialog::Create(nullptr, id, wxString(), wxDefaultPosition, wxDefaultSize,
                      wxNO_BORDER | wxSTAY_ON_TOP | wxFRAME_SHAPED | wxFRAME_NO_TASKBAR);
     m_lines = lines;
-    m_picture = LoadCommonBitmap("Helper::ModuleSplash");
+    m_picture = LoadCommonBitmap("Helper::ModuleSplash", GetContentScaleFactor());
     wxSafeYield(nullptr, false);
 
-    const wxSize size = m_picture.IsOk() ? m_picture.GetSize() : wxSize(0, 0);
+    const wxSize size = m_picture.IsOk() ? m_picture.GetLogicalSize() : wxSize(0, 0);
     SetClientSize(size);
     CentreOnPrimaryDisplay(this, size);
     SetWindowStyle(wxFRAME_SHAPED);

@@ -29,6 +29,6 @@ private:
     wxDECLARE_EVENT_TABLE();
 };
 
-// A picture of the common image set by its resource name; the first call registers
-// the image handlers and the set.
-wxBitmap LoadCommonBitmap(const wxString& name);
+// A picture of the common image set by its resource name, for a display of the given
+// scale; the first call registers the image handlers and the set.
+wxBitmap LoadCommonBitmap(const wxString& name, double scale);

@@ -14,6 +14,10 @@ void ShapeToPicture(wxTopLevelWindow* window, const wxBitmap& picture)
     if (!picture.IsOk())
         return;
     wxRegion shape;
-    shape.Union(picture);
+    // A region from a bitmap counts physical pixels; a window is shaped in logical ones.
+    if (picture.GetMask())
+        shape.Union(picture);
+    else
+        shape.Union(wxRect(picture.GetLogicalSize()));
     window->SetShape(shape);
 }

@@ -4,8 +4,8 @@
 #include "about/VersionInfo.h"
 #include "resources/ImageSets.h"
 
+#include <wx/display.h>
 #include <wx/intl.h>
-#include <wx/xrc/xmlres.h>
 
 namespace {
 
@@ -145,8 +145,9 @@ void ShowSplash(bool startup, int milliseconds)
     EnsureLauncherImages();
     int windowLineCount = 0;
     const wxArrayString lines = SplashLines(startup, windowLineCount);
-    const wxBitmap picture = wxXmlResource::Get()->LoadBitmap(
-        startup ? "Veltro2AppFrame::SplashMainApp" : "Veltro2AppFrame::SplashAboutMainApp");
+    const wxBitmap picture = LoadPicture(startup ? "Veltro2AppFrame::SplashMainApp"
+                                                 : "Veltro2AppFrame::SplashAboutMainApp",
+                                         wxDisplay().GetScaleFactor());
     const wxPoint textCentre = startup ? wxPoint(162, 346) : wxPoint(192, 372);
     // The About box may be dismissed at once; the start-up splash only by its timer.
     new ZelAboutSplashScreen(-1, startup, milliseconds, picture, lines, textCentre, windowLineCount,

@@ -90,7 +90,9 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     m_colour = colour;
     wxSafeYield(nullptr, false);
 
-    const wxSize size = picture.IsOk() ? picture.GetSize() : wxSize(0, 0);
+    // Logical pixels; the picture may have more physical ones on a scaled display.
+    const wxSize size = picture.IsOk() ? picture.GetLogicalSize() : wxSize(0, 0);
+    const double scale = picture.IsOk() ? picture.GetScaleFactor() : 1.0;
     SetSize(size);
     CentreOnPrimaryDisplay(this, size);
     ShapeToPicture(this, m_background);
@@ -107,7 +109,8 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     const int perLine = startup ? kStartupPixelsPerLine : kAboutPixelsPerLine;
     const int height = std::min(int(lines.size()), windowLineCount) * perLine;
     const wxFont font = SplashTextFont(this);
-    m_text = DrawTextLinesToBitmap(wxDefaultSize, wxDefaultPosition, font, lines, m_colour, 0, -1);
+    m_text = DrawTextLinesToBitmap(wxDefaultSize, wxDefaultPosition, font, lines, m_colour, 0, -1,
+                                   scale);
     // Left to the theme, each device context made on the window, two per paint, would look
     // the window's font and colours up in it again.
     SetOwnFont(font);
@@ -116,7 +119,7 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     if (m_background.IsOk())
         m_composite = m_background.GetSubBitmap(wxRect(size));
     if (m_composite.IsOk() && m_text.IsOk())
-        m_textWindow = PlaceTextWindow(size.x, m_text.GetSize(), textCentre, height, margin);
+        m_textWindow = PlaceTextWindow(size.x, m_text.GetLogicalSize(), textCentre, height, margin);
     // Only the text window of the background is ever copied again; the rest of it would
     // only double the composite.
     m_background = m_textWindow.IsEmpty() ? wxBitmap() : m_background.GetSubBitmap(m_textWindow);
@@ -179,8 +182,8 @@ void ZelSplashScreen::BlendWithScreen()
             return;
         const int width = picture.GetWidth(), height = picture.GetHeight();
         // Without a capture (no X11 desktop) the picture is shown unblended.
-        blended = CaptureScreen(wxRect(GetPosition(), picture.GetSize()));
-        if (!blended.IsOk() || !blended.GetData())
+        blended = CaptureScreen(wxRect(GetPosition(), m_background.GetLogicalSize()));
+        if (!blended.IsOk() || !blended.GetData() || blended.GetSize() != picture.GetSize())
             return;
         unsigned char* out = blended.GetData();
         const unsigned char* in = picture.GetData();
@@ -193,8 +196,9 @@ void ZelSplashScreen::BlendWithScreen()
     }
     // The loaded picture goes before the blend becomes a bitmap: the two would only add
     // to the window's peak memory.
+    const double scale = m_background.GetScaleFactor();
     m_background = wxBitmap();
-    m_background = wxBitmap(blended);
+    m_background = wxBitmap(blended, wxBITMAP_SCREEN_DEPTH, scale);
 }
 
 void ZelSplashScreen::UpdateText()
@@ -202,7 +206,7 @@ void ZelSplashScreen::UpdateText()
     if (!m_composite.IsOk() || !m_text.IsOk() || m_textWindow.IsEmpty())
         return;
     const int x = m_textWindow.x, y = m_textWindow.y, w = m_textWindow.width;
-    const int h = m_textWindow.height, total = m_text.GetHeight(), s = m_scrollOffset;
+    const int h = m_textWindow.height, total = m_text.GetLogicalSize().y, s = m_scrollOffset;
     m_compositeDC.Blit(x, y, w, h, &m_backgroundDC, 0, 0, wxCOPY, false);
     // A copy from a source with alpha is blended over what lies beneath it.
     auto draw = [&](int fromRow, int rows, int atY) {
@@ -233,7 +237,7 @@ void ZelSplashScreen::OnTimer(wxTimerEvent&)
     }
     if (m_timer.IsOneShot())
         m_timer.Start(kScrollPeriodMs, wxTIMER_CONTINUOUS);
-    if (++m_scrollOffset >= m_text.GetHeight())
+    if (++m_scrollOffset >= m_text.GetLogicalSize().y)
         m_scrollOffset = 0;
     UpdateText();
 }

@@ -1,9 +1,12 @@
 #include "app/Veltro3App.h"
 
+#include <wx/display.h>
 #include <wx/msgdlg.h>
 #include <wx/settings.h>
 
 #include <gdk/gdk.h>
+
+#include <algorithm>
 
 namespace {
 
@@ -17,6 +20,10 @@ const Resolution kResolutionPresets[] = {
     {800, 600},  {1024, 768},  {1152, 864}, {1280, 768},
     {1280, 960}, {1280, 1024}, {1280, 600}, {1280, 720},
 };
+
+// What the launcher's windows take on the screen, in logical pixels: the frame (its
+// 564 x 344 view under the menu bar), the start-up splash and the About box.
+const wxSize kWindowSizes[] = {{564, 369}, {445, 425}, {443, 454}};
 
 // A Wayland display may have no input seat at all (a headless or kiosk compositor). GTK's
 // message box first releases the pointer, which GDK then looks up on the missing seat and
@@ -41,8 +48,16 @@ bool Veltro3App::CheckScreenResolution(int preset)
 {
     int width = 0, height = 0;
     GetMinimumResolution(preset, width, height);
-    const int screenWidth = wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_X, nullptr);
-    const int screenHeight = wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_Y, nullptr);
+    // The preset counts the monitor's own pixels. A desktop scaled to 200% shows a
+    // 2560 x 1440 monitor as 1280 x 720, and there the windows, scaled alike, need
+    // more than the preset.
+    const double scale = wxDisplay().GetScaleFactor();
+    for (const wxSize& size : kWindowSizes) {
+        width = std::max(width, wxRound(size.x * scale));
+        height = std::max(height, wxRound(size.y * scale));
+    }
+    const int screenWidth = wxRound(wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_X) * scale);
+    const int screenHeight = wxRound(wxSystemSettingsNative::GetMetric(wxSYS_SCREEN_Y) * scale);
     if (screenWidth >= width && screenHeight >= height)
         return true;
 

@@ -29,6 +29,8 @@ public:
     void OnIdle(wxIdleEvent& event);
     void RunDeferredStartup();
     void OpenPendingFile();
+    // Whether the screen offers the preset and room for the launcher's windows at the
+    // desktop's scale; shows the message when it does not.
     bool CheckScreenResolution(int preset);
     static void GetMinimumResolution(int preset, int& width, int& height);
 

@@ -61,11 +61,41 @@ int RoomForLines(int anchorX, int width, int alignment)
     return width - anchorX;
 }
 
+// Shrinks `font` one point at a time, never below 7 points, until the widest line
+// fits `room` with the reserve to spare (no room: no fitting); measures it at its size.
+Measured Fit(wxDC& dc, wxFont& font, const wxArrayString& lines, int lineSpacing, int room)
+{
+    Measured m;
+    for (int points = font.GetPointSize();; --points) {
+        font.SetPointSize(points);
+        dc.SetFont(font);
+        m = Measure(dc, lines, lineSpacing);
+        if (room < 0 || m.widest <= room - kWidthReserve || points - 1 < kSmallestFittedSize)
+            return m;
+    }
+}
+
+wxBitmap NewBitmap(const wxSize& size, double scale)
+{
+    wxBitmap bitmap;
+    bitmap.CreateWithDIPSize(size, scale);
+    return bitmap;
+}
+
 } // namespace
+
+wxFont FitFontToWidth(const wxFont& font, const wxArrayString& lines, int room)
+{
+    wxFont fitted(font);
+    wxBitmap scratch(1, 1);
+    wxMemoryDC dc(scratch);
+    Fit(dc, fitted, lines, 0, room);
+    return fitted;
+}
 
 wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
                                const wxArrayString& lines, const wxColour& colour, int alignment,
-                               int lineSpacing)
+                               int lineSpacing, double scale)
 {
     const double luminance = kGreen * colour.Green() + kRed * colour.Red() + kBlue * colour.Blue();
     const bool light = luminance >= 127.5;
@@ -75,29 +105,21 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
     wxFont fitted(font);
     Measured m;
     {
-        wxBitmap scratch(1, 1);
+        // Measured at the scale it is drawn at: glyphs are hinted per pixel.
+        wxBitmap scratch = NewBitmap(wxSize(1, 1), scale);
         wxMemoryDC dc(scratch);
-        int points = fitted.GetPointSize();
         const int room = size.GetWidth() == -1
-                             ? 0
+                             ? -1
                              : RoomForLines(AnchorX(position.x, size.GetWidth(), alignment),
                                             size.GetWidth(), alignment);
-        for (;;) {
-            fitted.SetPointSize(points);
-            dc.SetFont(fitted);
-            m = Measure(dc, lines, lineSpacing);
-            if (size.GetWidth() == -1 || m.widest <= room - kWidthReserve ||
-                points - 1 < kSmallestFittedSize)
-                break;
-            --points;
-        }
+        m = Fit(dc, fitted, lines, lineSpacing, room);
     }
 
     const int width = size.GetWidth() == -1 ? m.widest : size.GetWidth();
     const int height = size.GetHeight() == -1 ? m.totalHeight : size.GetHeight();
     if (width <= 0 || height <= 0)
         return wxBitmap();
-    wxBitmap bitmap(width, height);
+    wxBitmap bitmap = NewBitmap(wxSize(width, height), scale);
     if (!bitmap.IsOk())
         return bitmap;
 
@@ -142,7 +164,7 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
         image.InitAlpha();
     unsigned char* rgb = image.GetData();
     unsigned char* alpha = image.GetAlpha();
-    const long pixels = static_cast<long>(width) * height;
+    const long pixels = static_cast<long>(image.GetWidth()) * image.GetHeight();
     for (long i = 0; i < pixels; ++i, rgb += 3) {
         const int v = static_cast<int>(kRed * rgb[0] + kGreen * rgb[1] + kBlue * rgb[2] + 0.5);
         alpha[i] = static_cast<unsigned char>(light ? v : 255 - v);
@@ -150,28 +172,34 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
         rgb[1] = colour.Green();
         rgb[2] = colour.Blue();
     }
-    return wxBitmap(image);
+    return wxBitmap(image, wxBITMAP_SCREEN_DEPTH, scale);
 }
 
 wxBitmap DrawTextToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
                           const wxString& text, const wxColour& colour, int alignment,
-                          int lineSpacing)
+                          int lineSpacing, double scale)
 {
     wxArrayString lines;
     for (wxString rest = text; !rest.empty(); rest = rest.AfterFirst('\n'))
         lines.Add(rest.BeforeFirst('\n'));
-    return DrawTextLinesToBitmap(size, position, font, lines, colour, alignment, lineSpacing);
+    return DrawTextLinesToBitmap(size, position, font, lines, colour, alignment, lineSpacing,
+                                 scale);
 }
 
 wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay, const wxPoint& position)
 {
     if (!base.IsOk() || !overlay.IsOk())
         return wxBitmap();
-    const wxPoint pos = position == wxDefaultPosition ? wxPoint(0, 0) : position;
+    // Physical pixels from here on.
+    const double scale = base.GetScaleFactor();
+    const wxPoint pos = position == wxDefaultPosition ? wxPoint(0, 0) : position * scale;
+    const double overScale = scale / overlay.GetScaleFactor();
+    const wxSize overSize(wxRound(overlay.GetWidth() * overScale),
+                          wxRound(overlay.GetHeight() * overScale));
     const int left = std::max(pos.x, 0);
     const int top = std::max(pos.y, 0);
-    const int right = std::min(base.GetWidth(), overlay.GetWidth() + pos.x);
-    const int bottom = std::min(base.GetHeight(), overlay.GetHeight() + pos.y);
+    const int right = std::min(base.GetWidth(), overSize.x + pos.x);
+    const int bottom = std::min(base.GetHeight(), overSize.y + pos.y);
     const int fromX = std::max(-pos.x, 0);
     const int fromY = std::max(-pos.y, 0);
     if (right <= left || bottom <= top)
@@ -181,6 +209,8 @@ wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay, const wx
     wxImage over = overlay.ConvertToImage();
     if (!result.IsOk() || !over.IsOk() || !result.GetData() || !over.GetData())
         return base;
+    if (over.GetSize() != overSize)
+        over.Rescale(overSize.x, overSize.y, wxIMAGE_QUALITY_HIGH);
     // A picture whose alpha is only 0 or 255 may come with a mask instead.
     if (!result.HasAlpha())
         result.InitAlpha();
@@ -211,7 +241,7 @@ wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay, const wx
             result.GetAlpha()[b] = static_cast<unsigned char>(a * 255.0f + 0.5f);
         }
     }
-    return wxBitmap(result);
+    return wxBitmap(result, wxBITMAP_SCREEN_DEPTH, scale);
 }
 
 wxFont GetUIFont(int pointSize, int weight)

@@ -14,20 +14,26 @@
 // that dimension to the text; a position component of -1 takes the anchor
 // from `alignment`. With a width given, the font shrinks (down to 7 points)
 // until the widest line fits the room right of the anchor. Invalid when the
-// size comes out empty.
+// size comes out empty. Sizes and positions are logical pixels; the bitmap
+// has `scale` times as many physical ones, with that scale factor.
 wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
                                const wxArrayString& lines, const wxColour& colour, int alignment,
-                               int lineSpacing);
+                               int lineSpacing, double scale = 1.0);
 
 // The same for one text whose lines are separated by line feeds; a trailing
 // line feed adds no empty line.
 wxBitmap DrawTextToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
                           const wxString& text, const wxColour& colour, int alignment,
-                          int lineSpacing);
+                          int lineSpacing, double scale = 1.0);
+
+// The font at the largest size, from its own down to 7 points, at which every
+// line is at most `room` - 2 pixels wide.
+wxFont FitFontToWidth(const wxFont& font, const wxArrayString& lines, int room);
 
 // A copy of `base` with `overlay` laid over it at `position` (wxDefaultPosition
 // is the top-left corner), "over" operator on unpremultiplied colour. Invalid
-// when either input is invalid.
+// when either input is invalid. The position is in the base's logical pixels;
+// an overlay of another scale factor is resampled to the base's.
 wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay,
                          const wxPoint& position = wxDefaultPosition);
 

@@ -1,5 +1,8 @@
 #include "controls/ZelStaticBitmap.h"
 
+#include "controls/ButtonAccessible.h"
+#include "platform/KeyboardFocus.h"
+
 #include <wx/dcclient.h>
 #include <wx/dcmemory.h>
 #include <wx/image.h>
@@ -39,6 +42,8 @@ wxBEGIN_EVENT_TABLE(ZelStaticBitmap, wxControl)
     EVT_MOVE(ZelStaticBitmap::OnMove)
     EVT_MOUSE_EVENTS(ZelStaticBitmap::OnMouse)
     EVT_KILL_FOCUS(ZelStaticBitmap::OnKillFocus)
+    EVT_SET_FOCUS(ZelStaticBitmap::OnSetFocus)
+    EVT_KEY_DOWN(ZelStaticBitmap::OnKeyDown)
     EVT_MOUSE_CAPTURE_LOST(ZelStaticBitmap::OnCaptureLost)
 wxEND_EVENT_TABLE()
 // clang-format on
@@ -53,10 +58,12 @@ ZelStaticBitmap::ZelStaticBitmap(wxWindow* parent, wxWindowID id, const wxBitmap
     wxControl::Create(parent, id, pos, size, style, wxDefaultValidator, name);
     SetBitmap(bitmap);
     SetInitialSize(size);
+    ExposeAsButton(this);
 }
 
 ZelStaticBitmap::~ZelStaticBitmap()
 {
+    ForgetButton(this);
     if (HasCapture())
         ReleaseMouse();
 }
@@ -202,7 +209,7 @@ wxSize ZelStaticBitmap::DoGetBestSize() const
     wxSize best(0, 0);
     for (const wxBitmap* b : {&m_bitmap, &m_bitmapDisabled, &m_bitmapHover, &m_bitmapPressed})
         if (b->IsOk())
-            best.IncTo(b->GetSize());
+            best.IncTo(b->GetLogicalSize());
     if (m_framed)
         best += wxSize(4, 6);
     return best;
@@ -217,7 +224,7 @@ const wxBitmap& ZelStaticBitmap::ShownForState(int state) const
     return m_bitmap;
 }
 
-void ZelStaticBitmap::SendClick()
+void ZelStaticBitmap::Click()
 {
     wxCommandEvent click(wxEVT_BUTTON, GetId());
     InitCommandEvent(click);
@@ -249,10 +256,10 @@ void ZelStaticBitmap::OnMouse(wxMouseEvent& event)
         // GTK may hand over the release before the motion that left the
         // control: a release outside never clicks.
         if (s == STATE_PRESSED && inside)
-            SendClick();
+            Click();
         n = inside ? STATE_HOVER : STATE_NORMAL;
     } else if (event.LeftDClick()) {
-        SendClick();
+        Click();
         n = STATE_HOVER;
     } else if (event.LeftIsDown() && HasCapture()) {
         if (inside && s == STATE_NORMAL)
@@ -284,8 +291,12 @@ void ZelStaticBitmap::OnPaint(wxPaintEvent&)
     const wxSize size = GetClientSize();
     if (size.x <= 0 || size.y <= 0)
         return;
-    if (!m_backBuffer || !m_backBuffer->IsOk() || m_backBuffer->GetSize() != size) {
-        m_backBuffer = std::make_unique<wxBitmap>(size.x, size.y);
+    // Of the display's physical pixels, so that a scaled display shows the images' own.
+    const double scale = GetContentScaleFactor();
+    if (!m_backBuffer || !m_backBuffer->IsOk() || m_backBuffer->GetLogicalSize() != size ||
+        m_backBuffer->GetScaleFactor() != scale) {
+        m_backBuffer = std::make_unique<wxBitmap>();
+        m_backBuffer->CreateWithDIPSize(size, scale);
         m_dirty = true;
     }
     if (m_dirty) {
@@ -294,6 +305,9 @@ void ZelStaticBitmap::OnPaint(wxPaintEvent&)
         m_dirty = false;
     }
     dc.DrawBitmap(*m_backBuffer, 0, 0, false);
+    // Over the buffer, so that the looks stay as they are without the focus.
+    if (HasFocus() && IsFocusShown(this))
+        DrawFocusMark(dc, size.x, size.y);
 }
 
 void ZelStaticBitmap::Render(wxDC& dc, int w, int h)
@@ -352,9 +366,10 @@ void ZelStaticBitmap::Render(wxDC& dc, int w, int h)
         DrawFrameFill(dc, w, h, top, bottom);
     }
 
-    if (image->IsOk() && image->GetWidth() > 0 && image->GetHeight() > 0) {
+    const wxSize imageSize = image->IsOk() ? image->GetLogicalSize() : wxSize();
+    if (imageSize.x > 0 && imageSize.y > 0) {
         if (m_centred)
-            dc.DrawBitmap(*image, (w - image->GetWidth()) / 2, (h - image->GetHeight()) / 2, true);
+            dc.DrawBitmap(*image, (w - imageSize.x) / 2, (h - imageSize.y) / 2, true);
         else
             dc.DrawBitmap(*image, 2, 3, true);
     }
@@ -420,9 +435,44 @@ void ZelStaticBitmap::OnMove(wxMoveEvent& event)
     event.Skip();
 }
 
+void ZelStaticBitmap::DrawFocusMark(wxDC& dc, int w, int h)
+{
+    dc.SetPen(wxPen(SysColour(wxSYS_COLOUR_HIGHLIGHT), 2, wxPENSTYLE_SOLID));
+    dc.SetBrush(*wxTRANSPARENT_BRUSH);
+    dc.DrawRoundedRectangle(1, 1, w - 2, h - 2, 4.0);
+}
+
 void ZelStaticBitmap::OnKillFocus(wxFocusEvent& event)
 {
+    Refresh(false);
     event.Skip();
+}
+
+void ZelStaticBitmap::OnSetFocus(wxFocusEvent& event)
+{
+    Refresh(false);
+    event.Skip();
+}
+
+void ZelStaticBitmap::OnKeyDown(wxKeyEvent& event)
+{
+    switch (event.GetKeyCode()) {
+    case WXK_SPACE:
+    case WXK_RETURN:
+    case WXK_NUMPAD_SPACE:
+    case WXK_NUMPAD_ENTER:
+        if (IsEnabled())
+            Click();
+        break;
+    default:
+        event.Skip();
+    }
+}
+
+void ZelStaticBitmap::GTKHandleRealized()
+{
+    wxControl::GTKHandleRealized();
+    DropInputMethod(this);
 }
 
 void ZelStaticBitmap::OnSysColourChanged(wxSysColourChangedEvent& event)
@@ -455,5 +505,5 @@ wxBitmap MakeDisabledBitmap(const wxBitmap& bitmap, const wxColour& colour, doub
         std::copy(source.GetAlpha(), source.GetAlpha() + static_cast<long>(w) * h,
                   result.GetAlpha());
     }
-    return wxBitmap(result);
+    return wxBitmap(result, wxBITMAP_SCREEN_DEPTH, bitmap.GetScaleFactor());
 }

@@ -1,8 +1,10 @@
 // The launcher's image button: a borderless control that shows one of five
 // images by state (normal, hover, pressed, toggled, disabled), follows the
 // mouse with capture and sends a button-click command event like a native
-// button. It never takes the focus; an optional framed look draws a rounded
-// bevel behind the image.
+// button. It takes the keyboard focus (Space and Return click it, a mark
+// shows the focus once the keyboard is used) and, given a label, answers
+// screen readers as a push button named by it; an optional framed look draws
+// a rounded bevel behind the image.
 #pragma once
 
 #include <wx/bitmap.h>
@@ -51,15 +53,20 @@ public:
     virtual void OnPaint(wxPaintEvent& event);
     virtual void OnMouse(wxMouseEvent& event);
     virtual void OnKillFocus(wxFocusEvent& event);
+    virtual void OnSetFocus(wxFocusEvent& event);
+    virtual void OnKeyDown(wxKeyEvent& event);
     virtual void OnCaptureLost(wxMouseCaptureLostEvent& event);
 
     bool Enable(bool enable = true) override;
-    bool AcceptsFocus() const override { return false; }
-    bool AcceptsFocusFromKeyboard() const override { return false; }
     bool SetBackgroundColour(const wxColour& colour) override;
 
     // 0 normal, 1 hover (pointer over it), 2 pressed (left button held on it).
     int GetState() const { return m_state; }
+
+    // Sends the button-click command event, as a click with the mouse does.
+    void Click();
+
+    void GTKHandleRealized() override;
 
 protected:
     wxSize DoGetBestSize() const override;
@@ -68,10 +75,10 @@ private:
     void Invalidate();
     void DeriveDisabledBitmap();
     const wxBitmap& ShownForState(int state) const;
-    void SendClick();
     void Render(wxDC& dc, int w, int h);
     void DrawFrameFill(wxDC& dc, int w, int h, const wxColour& top, const wxColour& bottom);
     void DrawFrameEdges(wxDC& dc, int w, int h, const wxColour& outer, const wxColour& inner);
+    void DrawFocusMark(wxDC& dc, int w, int h);
 
     wxBitmap m_bitmap;
     wxBitmap m_bitmapHover;

@@ -1,17 +1,36 @@
 #include "frame/Veltro3MainAppDialogController.h"
 
 #include "controls/TextBitmap.h"
+#include "platform/KeyboardFocus.h"
+#include "resources/ImageSets.h"
 
 #include <wx/dcclient.h>
 #include <wx/dcmemory.h>
 #include <wx/settings.h>
-#include <wx/xrc/xmlres.h>
 
 namespace {
 // The launcher picture is laid out for exactly this client size.
 const wxSize kViewSize(564, 344);
 const wxPoint kCreateTitle(250, 25);
 const wxPoint kEvaluateTitle(418, 25);
+// Each title stays above its column of buttons, which ends here.
+const int kCreateColumnRight = 380;
+const int kEvaluateColumnRight = 557;
+
+// One size for both titles, the largest at which each fits its column: large
+// desktop text would otherwise run "Evaluate Profile" into the window's edge.
+wxFont TitleFont()
+{
+    const wxFont font = GetUIFont(8, wxBOLD);
+    auto fit = [&font](const wxString& title, int room) {
+        wxArrayString lines;
+        lines.Add(title);
+        return FitFontToWidth(font, lines, room);
+    };
+    const wxFont create = fit(_("Create Profile"), kCreateColumnRight - kCreateTitle.x);
+    const wxFont evaluate = fit(_("Evaluate Profile"), kEvaluateColumnRight - kEvaluateTitle.x);
+    return create.GetPointSize() < evaluate.GetPointSize() ? create : evaluate;
+}
 } // namespace
 
 // clang-format off
@@ -34,7 +53,8 @@ Veltro3MainAppDialogController::Veltro3MainAppDialogController(wxWindow* parent,
     : wxPanel(parent, id, pos, size, style, name)
 {
     ResetViewColour();
-    m_background = wxXmlResource::Get()->LoadBitmap("Veltro2AppFrame::LauncherBG");
+    m_background = LoadPicture("Veltro2AppFrame::LauncherBG", GetContentScaleFactor());
+    m_titleFont = TitleFont();
     SetInitialSize(size);
 }
 
@@ -55,6 +75,12 @@ void Veltro3MainAppDialogController::Refresh(bool eraseBackground, const wxRect*
     wxPanel::Refresh(eraseBackground, rect);
 }
 
+void Veltro3MainAppDialogController::GTKHandleRealized()
+{
+    wxPanel::GTKHandleRealized();
+    DropInputMethod(this);
+}
+
 wxSize Veltro3MainAppDialogController::DoGetBestSize() const
 {
     return kViewSize;
@@ -66,8 +92,13 @@ void Veltro3MainAppDialogController::OnPaint(wxPaintEvent&)
     const wxSize size = GetClientSize();
     if (size.x <= 0 || size.y <= 0)
         return;
-    if (!m_backBuffer.IsOk() || m_backBuffer.GetSize() != size) {
-        m_backBuffer = wxBitmap(size.x, size.y);
+    // Of the display's physical pixels: a scaled display shows the pictures' own pixels
+    // and text drawn at its resolution.
+    const double scale = GetContentScaleFactor();
+    if (!m_backBuffer.IsOk() || m_backBuffer.GetLogicalSize() != size ||
+        m_backBuffer.GetScaleFactor() != scale) {
+        m_backBuffer = wxBitmap();
+        m_backBuffer.CreateWithDIPSize(size, scale);
         m_dirty = true;
     }
     if (!m_backBuffer.IsOk())
@@ -89,7 +120,7 @@ void Veltro3MainAppDialogController::DrawBackground(wxDC& dc)
     if (IsUsablePicture(m_background))
         dc.DrawBitmap(m_background, 0, 0, true);
 
-    dc.SetFont(GetUIFont(8, wxBOLD));
+    dc.SetFont(m_titleFont);
     dc.SetTextForeground(DarkOnPicture(dc.GetTextForeground()));
     dc.DrawText(_("Create Profile"), kCreateTitle);
     dc.DrawText(_("Evaluate Profile"), kEvaluateTitle);

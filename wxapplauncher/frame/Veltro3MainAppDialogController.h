@@ -5,6 +5,7 @@
 
 #include <wx/bitmap.h>
 #include <wx/colour.h>
+#include <wx/font.h>
 #include <wx/panel.h>
 
 class Veltro3MainAppDialogController : public wxPanel
@@ -24,6 +25,9 @@ public:
     // Every refresh re-renders the back buffer.
     void Refresh(bool eraseBackground = true, const wxRect* rect = nullptr) override;
 
+    // The panel takes no text: it keeps no input method (see DropInputMethod).
+    void GTKHandleRealized() override;
+
 protected:
     wxSize DoGetBestSize() const override;
     void DrawBackground(wxDC& dc);
@@ -33,6 +37,7 @@ protected:
 private:
     wxBitmap m_backBuffer;
     wxBitmap m_background;
+    wxFont m_titleFont;
     wxColour m_viewColour;
     bool m_dirty = true;
 

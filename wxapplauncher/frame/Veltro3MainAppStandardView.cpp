@@ -5,11 +5,12 @@
 #include "frame/DragNDrop.h"
 #include "frame/Ids.h"
 #include "frame/ModuleCatalog.h"
+#include "resources/ImageSets.h"
 
 #include <wx/app.h>
 #include <wx/frame.h>
 #include <wx/menu.h>
-#include <wx/xrc/xmlres.h>
+#include <wx/utils.h>
 
 namespace {
 
@@ -34,11 +35,9 @@ const ButtonPlace kPlaces[] = {
 // The size of the highlight pictures, used when they are missing.
 const wxSize kButtonSize(152, 58);
 const wxColour kHelpButtonColour(218, 217, 221);
-
-wxBitmap Picture(const wxString& name)
-{
-    return wxXmlResource::Get()->LoadBitmap("Veltro2AppFrame::" + name);
-}
+// Labels start this far right of the icon's width.
+const int kLabelGap = 16;
+const int kIconWidth = 48;
 
 } // namespace
 
@@ -58,14 +57,25 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
                                                        long style, const wxString& name)
     : Veltro3MainAppDialogController(parent, id, pos, size, style, name)
 {
+    const double scale = GetContentScaleFactor();
+    auto Picture = [scale](const wxString& name) {
+        return LoadPicture("Veltro2AppFrame::" + name, scale);
+    };
     const wxCursor hand(wxCURSOR_HAND);
     const wxBitmap highlight = Picture("HighlightBackground");
     const wxBitmap highlightPressed = Picture("HighlightPressed");
-    const wxSize canvasSize = IsUsablePicture(highlight) ? highlight.GetSize() : kButtonSize;
-    const wxBitmap blank =
-        DrawTextToBitmap(canvasSize, wxDefaultPosition, GetFont(), wxString(), *wxBLACK, 0, 0);
+    const wxSize canvasSize = IsUsablePicture(highlight) ? highlight.GetLogicalSize() : kButtonSize;
+    const wxBitmap blank = DrawTextToBitmap(canvasSize, wxDefaultPosition, GetFont(), wxString(),
+                                            *wxBLACK, 0, 0, scale);
     const int middle = (369 - canvasSize.y) / 2;
     const int rowTops[] = {middle - 87, middle, middle + 82};
+
+    // One size for all labels, the largest at which the longest fits: large desktop
+    // text must not shrink one label alone.
+    wxArrayString labels;
+    for (const ButtonPlace& place : kPlaces)
+        labels.Add(wxGetTranslation(FindModule(place.moduleId)->buttonLabel));
+    m_labelFont = FitFontToWidth(GetFont(), labels, canvasSize.x - kIconWidth - kLabelGap);
 
     for (int i = 0; i < MODULE_COUNT; ++i) {
         const ButtonPlace& place = kPlaces[i];
@@ -82,6 +92,7 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
         m_buttons[i] = new ZelStaticBitmap(this, module->buttonId, m_images[i].normal,
                                            wxPoint(place.left, rowTops[place.row]), wxDefaultSize,
                                            wxNO_BORDER, "zelStaticBitmap");
+        m_buttons[i]->SetLabel(label);
         m_buttons[i]->SetCursor(hand);
         if (i == MONITOR || i == VERIFY || i == EDIT)
             m_buttons[i]->SetBackgroundColour(GetViewColour());
@@ -94,6 +105,15 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
         new ZelStaticBitmap(this, ID_BUTTON_HELP, Picture("Help"), wxPoint(10, GetSize().y - 40),
                             wxDefaultSize, ZSB_FRAMED, "zelStaticBitmap");
     m_helpButton->SetBackgroundColour(kHelpButtonColour);
+    m_helpButton->SetLabel(wxStripMenuCodes(_("&Help")));
+
+    // Tab goes down the left column, then the right one, then to Help.
+    ZelStaticBitmap* previous = m_buttons[PRINTER];
+    for (ZelStaticBitmap* next : {m_buttons[MONITOR], m_buttons[DEVICELINK], m_buttons[INSPECT],
+                                  m_buttons[EDIT], m_buttons[VERIFY], m_helpButton}) {
+        next->MoveAfterInTabOrder(previous);
+        previous = next;
+    }
 
     UpdateModuleButtons();
 }
@@ -106,12 +126,13 @@ wxBitmap Veltro3MainAppStandardView::ComposeButtonImage(const wxBitmap& canvas,
 {
     if (!IsUsablePicture(canvas))
         return canvas;
-    const int iconWidth = IsUsablePicture(icon) ? icon.GetWidth() : 0;
-    const wxSize size = canvas.GetSize();
+    const int iconWidth = IsUsablePicture(icon) ? icon.GetLogicalSize().x : 0;
+    const wxSize size = canvas.GetLogicalSize();
     // The pictures are light: a dark theme's light text colour would vanish.
-    const wxBitmap text =
-        DrawTextToBitmap(size, wxPoint(offset.x + iconWidth + 16, size.y / 2 + offset.y), GetFont(),
-                         label, DarkOnPicture(GetForegroundColour()), wxALIGN_CENTER_VERTICAL, 0);
+    const wxBitmap text = DrawTextToBitmap(
+        size, wxPoint(offset.x + iconWidth + kLabelGap, size.y / 2 + offset.y),
+        m_labelFont.IsOk() ? m_labelFont : GetFont(), label, DarkOnPicture(GetForegroundColour()),
+        wxALIGN_CENTER_VERTICAL, 0, canvas.GetScaleFactor());
     wxBitmap image = IsUsablePicture(icon) ? CompositeBitmap(canvas, icon, wxPoint(6, 2)) : canvas;
     if (text.IsOk())
         image = CompositeBitmap(image, text, wxPoint(0, 0));

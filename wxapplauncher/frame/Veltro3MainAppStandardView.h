@@ -6,6 +6,7 @@
 
 #include "frame/Veltro3MainAppDialogController.h"
 
+#include <wx/font.h>
 #include <wx/string.h>
 
 class ZelStaticBitmap;
@@ -57,6 +58,7 @@ private:
     ButtonImages m_images[MODULE_COUNT];
     ZelStaticBitmap* m_buttons[MODULE_COUNT] = {};
     ZelStaticBitmap* m_helpButton = nullptr;
+    wxFont m_labelFont; // the labels' font, fitted to the buttons
 
     wxDECLARE_EVENT_TABLE();
 };

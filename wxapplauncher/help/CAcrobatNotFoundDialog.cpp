@@ -34,10 +34,12 @@ CAcrobatNotFoundDialog::CAcrobatNotFoundDialog(wxWindow* parent)
     main->Add(10, 10, 0, wxALIGN_CENTER_HORIZONTAL | wxALL, 5);
 
     auto* title = new wxBoxSizer(wxHORIZONTAL);
-    title->Add(new ZelStaticBitmap(
-                   this, kIconId, wxArtProvider::GetBitmap(wxART_WARNING, wxART_CMN_DIALOG),
-                   wxDefaultPosition, wxDefaultSize, wxNO_BORDER, "zelStaticBitmap"),
-               0, wxALIGN_CENTER_VERTICAL | wxALL, 5);
+    auto* icon = new ZelStaticBitmap(
+        this, kIconId, wxArtProvider::GetBitmap(wxART_WARNING, wxART_CMN_DIALOG), wxDefaultPosition,
+        wxDefaultSize, wxNO_BORDER, "zelStaticBitmap");
+    // A picture here, not a button: Tab passes it by.
+    icon->DisableFocusFromKeyboard();
+    title->Add(icon, 0, wxALIGN_CENTER_VERTICAL | wxALL, 5);
     title->Add(10, 15, 0, wxALIGN_CENTER_VERTICAL | wxALL, 5);
     // The title and the hint line are as high as the font needs: 15 and 12
     // pixels cut them in the desktop's font.

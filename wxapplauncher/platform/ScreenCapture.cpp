@@ -25,13 +25,16 @@ int LowestBit(unsigned long mask)
 
 // The toolkit's screen device context reads nothing on GTK 3, so the root window is read
 // directly: one request to the server, with no intermediate surfaces on the way.
-wxImage CaptureScreen(const wxRect& area)
+wxImage CaptureScreen(const wxRect& logical)
 {
 #ifdef GDK_WINDOWING_X11
     GdkDisplay* display = gdk_display_get_default();
-    if (!display || !GDK_IS_X11_DISPLAY(display) || area.IsEmpty())
+    if (!display || !GDK_IS_X11_DISPLAY(display) || logical.IsEmpty())
         return wxImage();
     Display* x11 = GDK_DISPLAY_XDISPLAY(display);
+    // The server counts physical pixels; a desktop scaled to 200% has two per logical one.
+    const int scale = gdk_window_get_scale_factor(gdk_get_default_root_window());
+    const wxRect area(logical.GetPosition() * scale, logical.GetSize() * scale);
     // An area reaching off the screen is an X error, not a crash.
     gdk_x11_display_error_trap_push(display);
     XImage* shot = XGetImage(x11, DefaultRootWindow(x11), area.x, area.y, area.width, area.height,
@@ -61,7 +64,7 @@ wxImage CaptureScreen(const wxRect& area)
     XDestroyImage(shot);
     return image;
 #else
-    (void)area;
+    (void)logical;
     return wxImage();
 #endif
 }

@@ -5,4 +5,6 @@
 #include <wx/gdicmn.h>
 #include <wx/image.h>
 
-wxImage CaptureScreen(const wxRect& area);
+// The area is in logical pixels; the image has the screen's physical pixels of it, twice
+// as many each way on a desktop scaled to 200%.
+wxImage CaptureScreen(const wxRect& logical);

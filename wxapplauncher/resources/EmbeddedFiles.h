@@ -1,5 +1,5 @@
 // Files compiled into the program by the build (see EmbedFiles.cmake): the pictures of
-// one image set followed by its XRC document.
+// one image set followed by its XRC document, and the pictures' 2x renderings.
 #pragma once
 
 #include <cstddef>
@@ -16,6 +16,8 @@ struct EmbeddedImageSet
     const char* stem;
     const EmbeddedFile* files; // pictures in table order, the XRC document last
     std::size_t count;
+    const EmbeddedFile* scaled; // "<picture>@2x.png" for each picture
+    std::size_t scaledCount;
 };
 
 // The generated units, one per set.

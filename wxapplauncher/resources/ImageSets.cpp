@@ -5,6 +5,8 @@
 #include <wx/filesys.h>
 #include <wx/fs_mem.h>
 #include <wx/image.h>
+#include <wx/mstream.h>
+#include <wx/xml/xml.h>
 #include <wx/xrc/xh_bmp.h>
 #include <wx/xrc/xmlres.h>
 
@@ -39,6 +41,32 @@ void EnsureSet(bool& registered, void (*registerSet)())
     AddImageHandlers();
     registerSet();
     registered = true;
+}
+
+// The 2x rendering beside the file a resource name stands for; invalid when there is none.
+wxBitmap LoadDoubledRendering(const wxString& name)
+{
+    const wxXmlNode* node = wxXmlResource::Get()->GetResourceNode(name);
+    if (!node)
+        return wxBitmap();
+    const wxString path = node->GetNodeContent().Strip(wxString::both);
+    wxString stem = path.BeforeFirst('$'), base;
+    if (!path.AfterFirst('$').EndsWith(".png", &base))
+        return wxBitmap();
+    const wxString doubled = base + "@2x.png";
+    for (const EmbeddedImageSet& set :
+         {Veltro3AppFrameImages(), Veltro2AppFrameHelpImages(), CommonImages()}) {
+        if (stem != set.stem)
+            continue;
+        for (size_t i = 0; i < set.scaledCount; ++i) {
+            if (doubled != set.scaled[i].name)
+                continue;
+            wxMemoryInputStream stream(set.scaled[i].data, set.scaled[i].size);
+            const wxImage image(stream, wxBITMAP_TYPE_PNG);
+            return image.IsOk() ? wxBitmap(image, -1, 2.0) : wxBitmap();
+        }
+    }
+    return wxBitmap();
 }
 
 bool launcherImagesRegistered = false;
@@ -82,4 +110,23 @@ void EnsureHelpImages()
 void EnsureCommonImages()
 {
     EnsureSet(commonImagesRegistered, RegisterCommonImages);
+}
+
+wxBitmapBundle LoadPictureBundle(const wxString& name, double scale)
+{
+    const wxBitmap picture = wxXmlResource::Get()->LoadBitmap(name);
+    if (!picture.IsOk())
+        return wxBitmapBundle();
+    // A 1x display never decodes the larger rendering.
+    const wxBitmap doubled = scale > 1 ? LoadDoubledRendering(name) : wxBitmap();
+    if (!doubled.IsOk() || doubled.GetSize() != picture.GetSize() * 2)
+        return wxBitmapBundle::FromBitmap(picture);
+    return wxBitmapBundle::FromBitmaps(picture, doubled);
+}
+
+wxBitmap LoadPicture(const wxString& name, double scale)
+{
+    const wxBitmapBundle bundle = LoadPictureBundle(name, scale);
+    const wxSize size = bundle.GetDefaultSize();
+    return bundle.GetBitmap(scale > 1 ? size * scale : size);
 }
