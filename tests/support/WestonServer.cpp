@@ -3,6 +3,7 @@
 #include <chrono>
 #include <csignal>
 #include <cstdlib>
+#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <poll.h>
@@ -11,6 +12,7 @@
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
+#include <vector>
 
 namespace {
 
@@ -41,12 +43,27 @@ WestonServer::WestonServer(int width, int height, bool xwayland)
     const std::string options[] = {"--width=" + std::to_string(width),
                                    "--height=" + std::to_string(height), "--log=" + log,
                                    std::string("--socket=") + Socket()};
+    // The child of a threaded process may only exec: its environment is made here.
+    std::vector<std::string> env{"XDG_RUNTIME_DIR=" + m_runtimeDir};
+    for (char** var = environ; *var; ++var)
+        if (std::strncmp(*var, "XDG_RUNTIME_DIR=", 16) != 0)
+            env.emplace_back(*var);
+    std::vector<char*> envp;
+    for (std::string& var : env)
+        envp.push_back(var.data());
+    envp.push_back(nullptr);
+    const char* argv[] = {"weston",
+                          "--backend=headless-backend.so",
+                          "--no-config",
+                          options[0].c_str(),
+                          options[1].c_str(),
+                          options[2].c_str(),
+                          options[3].c_str(),
+                          xwayland ? "--xwayland" : nullptr,
+                          nullptr};
     m_pid = fork();
     if (m_pid == 0) {
-        setenv("XDG_RUNTIME_DIR", dir, 1);
-        execlp("weston", "weston", "--backend=headless-backend.so", "--no-config",
-               options[0].c_str(), options[1].c_str(), options[2].c_str(), options[3].c_str(),
-               xwayland ? "--xwayland" : nullptr, nullptr);
+        execvpe("weston", const_cast<char**>(argv), envp.data());
         _exit(127);
     }
 
