@@ -56,21 +56,6 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     EXPECT_GT(printer->GetBitmapHover().ConvertToImage().GetAlpha(30, 52), 100);
 
     wxUIActionSimulator sim;
-    auto pointAt = [&](wxWindow* w) {
-        const wxRect r = w->GetScreenRect();
-        sim.MouseMove(r.GetLeft() + r.width / 2, r.GetTop() + r.height / 2);
-    };
-    // Off the centre, where the click below goes, so that the two make no double click.
-    sim.MouseMove(printer->GetScreenPosition() + wxPoint(10, 10));
-    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapHover()); }));
-    sim.MouseDown();
-    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapPressed()); }));
-    sim.MouseMove(view->GetScreenPosition() + wxPoint(5, 100));
-    sim.MouseUp();
-    // The release is handled (the capture gone) before the pointer comes back.
-    EXPECT_TRUE(WaitFor([&] { return !printer->HasCapture(); }));
-    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
-
     // A real click on each button starts its module with its arguments, as its
     // File menu command does; Help reaches the frame.
     int helpClicks = 0;
@@ -100,7 +85,8 @@ TEST(LauncherViewTest, LooksAndStartsModules)
         ASSERT_TRUE(target) << b.id;
         EXPECT_EQ(target->GetRect(), wxRect(b.at, b.exe ? wxSize(152, 58) : wxSize(28, 30)));
         EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
-        pointAt(target);
+        const wxRect r = target->GetScreenRect();
+        sim.MouseMove(r.GetLeft() + r.width / 2, r.GetTop() + r.height / 2);
         sim.MouseClick();
         if (!b.exe)
             continue;
@@ -115,14 +101,16 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; }));
     EXPECT_EQ(SettledRecords(log).size(), started);
 
-    // Steps: i move in, o move out, d press, u release, 2 double click, h hide and
-    // show (breaks the grab); each with the state it leads to (0 normal, 1 hover, 2 pressed).
-    const std::pair<std::string, int> cases[] = {
-        {"i1 d2 o0 i2 u1", 1}, {"i1 21", 2}, {"i1 d2 h0 u0", 0}};
-    ZelStaticBitmap* help = button(1106);
+    // Steps: i move in, o move out, d press, u release, 2 double click, h hide and show
+    // (breaks the grab); each with the state it leads to (0 normal, 1 hover, 2 pressed),
+    // which the screen shows; then the clicks (modules started) it made.
+    const std::pair<std::string, size_t> cases[] = {
+        {"i1 d2 o0 u0", 0}, {"i1 d2 o0 i2 u1", 1}, {"i1 21", 2}, {"i1 d2 h0 u0", 0}};
+    const wxBitmap looks[] = {printer->GetBitmap(), printer->GetBitmapHover(),
+                              printer->GetBitmapPressed()};
     int x = -6;
     auto step = [&](char action, int state) {
-        const wxRect r = help->GetScreenRect();
+        const wxRect r = printer->GetScreenRect();
         if (action == 'i' || action == 'o')
             sim.MouseMove((action == 'i' ? r.GetLeft() : r.GetRight() + 50) + x, r.GetTop() + 15);
         else if (action == 'd')
@@ -132,19 +120,21 @@ TEST(LauncherViewTest, LooksAndStartsModules)
         else if (action == '2')
             sim.MouseDblClick();
         else
-            help->Hide(), help->Show();
-        return WaitFor([&] { return help->GetState() == state; });
+            printer->Hide(), printer->Show();
+        return WaitFor(
+            [&] { return printer->GetState() == state && Shows(printer, looks[state]); });
     };
     for (const auto& [steps, clicks] : cases) {
         // Presses of successive cases lie apart, so none makes a double click.
         x += 10;
-        helpClicks = 0;
         for (size_t i = 0; i < steps.size(); i += 3)
             EXPECT_TRUE(step(steps[i], steps[i + 1] - '0')) << steps << ": step " << i / 3;
+        // The release is handled (the capture gone) before the pointer comes back.
+        EXPECT_TRUE(WaitFor([&] { return !printer->HasCapture(); })) << steps;
         // Moving in and out again flushes every event the case caused.
         step('i', 1);
         step('o', 0);
-        EXPECT_EQ(helpClicks, clicks) << steps;
+        EXPECT_EQ(SettledRecords(log).size(), started += clicks) << steps;
     }
     frame->Destroy();
 }
