@@ -14,7 +14,6 @@
 #include <wx/uiaction.h>
 #include <wx/utils.h>
 
-#include <algorithm>
 #include <string>
 #include <tuple>
 
