@@ -1,5 +1,4 @@
-// Module launching beyond a plain click: files for Inspect, modules that are
-// missing, Verify's language and its running copy.
+// Module launching beyond a plain click: drops, missing modules, Verify's language and copy.
 #include "app/UserLanguage.h"
 #include "frame/DragNDrop.h"
 #include "frame/Veltro3AppFrame.h"
