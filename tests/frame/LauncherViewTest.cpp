@@ -1,20 +1,22 @@
-// The launcher view as a user sees it: the pixels on the screen, the buttons
-// under a real pointer, the processes a click starts.
+// The launcher's frame as a user sees it: the pixels on the screen, the buttons under a
+// real pointer, the processes a click starts, the menus, how it closes.
 #include "controls/TextBitmap.h"
 #include "controls/ZelStaticBitmap.h"
 #include "frame/Veltro3AppFrame.h"
 #include "frame/Veltro3MainAppStandardView.h"
 
 #include "support/DesktopTools.h"
+#include "support/DialogRecorder.h"
 #include "support/GuiWait.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
 
 #include <gtest/gtest.h>
+#include <wx/menu.h>
 #include <wx/uiaction.h>
 #include <wx/utils.h>
+#include <wx/weakref.h>
 
-#include <algorithm>
 #include <string>
 #include <tuple>
 
@@ -30,8 +32,23 @@ bool Shows(ZelStaticBitmap* button, const wxBitmap& image)
                       CompositeBitmap(wxBitmap(back), image).ConvertToImage());
 }
 
-TEST(LauncherViewTest, LooksAndStartsModules)
+// "|id label" per item, "|-" for a separator, a submenu's items in brackets.
+wxString Describe(const wxMenu* menu)
 {
+    wxString text;
+    for (const wxMenuItem* item : menu->GetMenuItems()) {
+        text += item->IsSeparator()
+                    ? wxString("|-")
+                    : wxString::Format("|%d ", item->GetId()) + item->GetItemLabel();
+        if (item->GetSubMenu())
+            text += "[" + Describe(item->GetSubMenu()) + "]";
+    }
+    return text;
+}
+
+TEST(LauncherViewTest, LooksStartsModulesAndExits)
+{
+    DialogRecorder dialogs;
     StandinDir install({"Quenta Print Studio.exe", "Monitor/Zel Display Studio.exe",
                         "Quenta Link Studio.exe", "ZelVerifyStudio.exe",
                         "Quenta Inspect Studio.exe", "Quenta Edit Studio.exe"});
@@ -56,21 +73,6 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     EXPECT_GT(printer->GetBitmapHover().ConvertToImage().GetAlpha(30, 52), 100);
 
     wxUIActionSimulator sim;
-    auto pointAt = [&](wxWindow* w) {
-        const wxRect r = w->GetScreenRect();
-        sim.MouseMove(r.GetLeft() + r.width / 2, r.GetTop() + r.height / 2);
-    };
-    // Off the centre, where the click below goes, so that the two make no double click.
-    sim.MouseMove(printer->GetScreenPosition() + wxPoint(10, 10));
-    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapHover()); }));
-    sim.MouseDown();
-    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmapPressed()); }));
-    sim.MouseMove(view->GetScreenPosition() + wxPoint(5, 100));
-    sim.MouseUp();
-    // The release is handled (the capture gone) before the pointer comes back.
-    EXPECT_TRUE(WaitFor([&] { return !printer->HasCapture(); }));
-    EXPECT_TRUE(WaitFor([&] { return Shows(printer, printer->GetBitmap()); }));
-
     // A real click on each button starts its module with its arguments, as its
     // File menu command does; Help reaches the frame.
     int helpClicks = 0;
@@ -100,7 +102,8 @@ TEST(LauncherViewTest, LooksAndStartsModules)
         ASSERT_TRUE(target) << b.id;
         EXPECT_EQ(target->GetRect(), wxRect(b.at, b.exe ? wxSize(152, 58) : wxSize(28, 30)));
         EXPECT_EQ(target->GetDropTarget() != nullptr, b.id == 1104) << "only Inspect takes drops";
-        pointAt(target);
+        const wxRect r = target->GetScreenRect();
+        sim.MouseMove(r.GetLeft() + r.width / 2, r.GetTop() + r.height / 2);
         sim.MouseClick();
         if (!b.exe)
             continue;
@@ -115,14 +118,16 @@ TEST(LauncherViewTest, LooksAndStartsModules)
     EXPECT_TRUE(WaitFor([&] { return helpClicks == 1; }));
     EXPECT_EQ(SettledRecords(log).size(), started);
 
-    // Steps: i move in, o move out, d press, u release, 2 double click, h hide and
-    // show (breaks the grab); each with the state it leads to (0 normal, 1 hover, 2 pressed).
-    const std::pair<std::string, int> cases[] = {
-        {"i1 d2 o0 i2 u1", 1}, {"i1 21", 2}, {"i1 d2 h0 u0", 0}};
-    ZelStaticBitmap* help = button(1106);
+    // Steps: i move in, o move out, d press, u release, 2 double click, h hide and show
+    // (breaks the grab); each with the state it leads to (0 normal, 1 hover, 2 pressed),
+    // which the screen shows; then the clicks (modules started) it made.
+    const std::pair<std::string, size_t> cases[] = {
+        {"i1 d2 o0 u0", 0}, {"i1 d2 o0 i2 u1", 1}, {"i1 21", 2}, {"i1 d2 h0 u0", 0}};
+    const wxBitmap looks[] = {printer->GetBitmap(), printer->GetBitmapHover(),
+                              printer->GetBitmapPressed()};
     int x = -6;
     auto step = [&](char action, int state) {
-        const wxRect r = help->GetScreenRect();
+        const wxRect r = printer->GetScreenRect();
         if (action == 'i' || action == 'o')
             sim.MouseMove((action == 'i' ? r.GetLeft() : r.GetRight() + 50) + x, r.GetTop() + 15);
         else if (action == 'd')
@@ -132,21 +137,46 @@ TEST(LauncherViewTest, LooksAndStartsModules)
         else if (action == '2')
             sim.MouseDblClick();
         else
-            help->Hide(), help->Show();
-        return WaitFor([&] { return help->GetState() == state; });
+            printer->Hide(), printer->Show();
+        return WaitFor(
+            [&] { return printer->GetState() == state && Shows(printer, looks[state]); });
     };
     for (const auto& [steps, clicks] : cases) {
         // Presses of successive cases lie apart, so none makes a double click.
         x += 10;
-        helpClicks = 0;
         for (size_t i = 0; i < steps.size(); i += 3)
             EXPECT_TRUE(step(steps[i], steps[i + 1] - '0')) << steps << ": step " << i / 3;
+        // The release is handled (the capture gone) before the pointer comes back.
+        EXPECT_TRUE(WaitFor([&] { return !printer->HasCapture(); })) << steps;
         // Moving in and out again flushes every event the case caused.
         step('i', 1);
         step('o', 0);
-        EXPECT_EQ(helpClicks, clicks) << steps;
+        EXPECT_EQ(SettledRecords(log).size(), started += clicks) << steps;
     }
-    frame->Destroy();
+
+    const wxMenuBar* bar = frame->GetMenuBar();
+    wxString menus;
+    for (size_t i = 0; i < bar->GetMenuCount(); ++i)
+        menus += bar->GetMenuLabel(i) + Describe(bar->GetMenu(i)) + "\n";
+    EXPECT_EQ(menus,
+              "&File|1001 Create &Printer Profile...|1002 Create &Monitor Profile..."
+              "|1003 Create &Device Link Profile...|-|1005 &Inspect Profile..."
+              "|1006 &Edit Profile...|1004 &Verify Color...|-|1007 E&xit\n"
+              "&Help|1015 Veltrona &Help\tF1|1016 User &Guide|1017 User &Forum|1107 H&ow-To|-"
+              "|1019 &About Veltrona|1023 About &Modules[|1025 Quenta Print Studio"
+              "|1026 Zel Display Studio|1027 Quenta Link Studio|1028 Quenta Inspect Studio"
+              "|1029 Quenta Edit Studio|1030 Zel Verify Studio]|-|1020 Check for &Updates...\n");
+    // A fixed size, and Exit closes it without asking.
+    const wxSize size = frame->GetSize();
+    EXPECT_EQ(frame->GetWindowStyle() & (wxRESIZE_BORDER | wxMAXIMIZE_BOX | wxMINIMIZE_BOX),
+              wxMINIMIZE_BOX);
+    frame->SetSize(900, 700);
+    EXPECT_EQ(frame->GetSize(), size);
+    const wxWeakRef<wxFrame> alive(frame);
+    frame->ProcessCommand(1007);
+    EXPECT_FALSE(frame->IsShown());
+    EXPECT_TRUE(WaitFor([&] { return !alive; }));
+    EXPECT_TRUE(dialogs.Dialogs().empty());
 }
 
 } // namespace

@@ -1,6 +1,5 @@
-// Runs the tests inside a real toolkit application on the X display of the
-// environment. The application is the launcher's own class with its start-up
-// left out, so code that reaches the application object finds the real one.
+// Runs the tests inside the launcher's own application class, its start-up left out,
+// on the environment's X display.
 #include "app/Veltro3App.h"
 
 #include <gtest/gtest.h>
@@ -32,8 +31,7 @@ int main(int argc, char** argv)
             << "toolkit assertion in " << func << ": " << cond << " " << msg;
     });
 
-    // The tests read other programs' accessible trees; their own toolkit
-    // stays off the accessibility bus, which they may start only later.
+    // The tests read other programs' accessible trees and start that bus themselves.
     setenv("NO_AT_BRIDGE", "1", 1);
     wxApp::SetInstance(new TestApp);
     const bool started = wxEntryStart(argc, argv);

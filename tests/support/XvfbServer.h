@@ -1,5 +1,4 @@
-// A private virtual X server with a screen of a chosen size, for tests that
-// need another screen than the one the suite runs on.
+// A private virtual X server with a screen of a chosen size.
 #pragma once
 
 #include <string>
