@@ -68,7 +68,7 @@ TEST(WaylandTest, RunsThroughXWaylandBesideItsModules)
 }
 
 // Forced onto Wayland with no seat: the screen check refuses without its message
-// (nobody could answer it), and a launcher that runs starts and ends cleanly.
+// (nobody could answer it), and a launcher that runs shows its whole view and ends cleanly.
 TEST(WaylandTest, RunsAndEndsWithoutAnInputSeat)
 {
     const struct
@@ -93,6 +93,11 @@ TEST(WaylandTest, RunsAndEndsWithoutAnInputSeat)
         ASSERT_TRUE(WIFEXITED(status)) << "signal " << WTERMSIG(status);
         EXPECT_EQ(WEXITSTATUS(status) == 0, c.runs);
         EXPECT_EQ(launcher.Events("shown").size(), c.runs ? 2u : 0u);
+        // GTK's own decorations do not eat into the view.
+        for (const ProbeEvent& e : launcher.Events("placed"))
+            if (e.fields[0] == "Veltrona") {
+                EXPECT_EQ(e.fields[3] + " x " + e.fields[4], "564 x 344");
+            }
     }
 }
 

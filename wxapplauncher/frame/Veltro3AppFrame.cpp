@@ -7,6 +7,7 @@
 #include "frame/ModuleCatalog.h"
 #include "frame/Veltro3MainAppStandardView.h"
 #include "help/Documentation.h"
+#include "platform/X11Windows.h"
 #include "resources/IconBundle.h"
 #include "resources/ImageSets.h"
 #include "settings/UpdateCheck.h"
@@ -37,6 +38,7 @@ wxBEGIN_EVENT_TABLE(Veltro3AppFrame, wxFrame)
     EVT_MENU_RANGE(ID_ABOUT_PRINTER, ID_ABOUT_VERIFY, Veltro3AppFrame::OnAboutModule)
     EVT_MENU(ID_HOW_TO, Veltro3AppFrame::OnHowTo)
     EVT_CLOSE(Veltro3AppFrame::OnClose)
+    EVT_SIZE(Veltro3AppFrame::OnSize)
     EVT_BUTTON(ID_BUTTON_HELP, Veltro3AppFrame::OnHelp)
 wxEND_EVENT_TABLE()
 // clang-format on
@@ -65,6 +67,7 @@ Veltro3AppFrame::Veltro3AppFrame(const wxString& title, const wxPoint& pos, cons
     m_sizer->SetSizeHints(this);
     SetMinSize(GetSize());
     SetMaxSize(GetSize());
+    m_fixedClientSize = GetClientSize();
 
     wxAcceleratorEntry helpTool(wxACCEL_ALT | wxACCEL_SHIFT, WXK_F1, ID_HELP_TOOL);
     SetAcceleratorTable(wxAcceleratorTable(1, &helpTool));
@@ -195,4 +198,20 @@ void Veltro3AppFrame::OnClose(wxCloseEvent&)
 {
     Show(false);
     Destroy();
+}
+
+void Veltro3AppFrame::OnSize(wxSizeEvent& event)
+{
+    // GTK on Wayland draws the decorations itself and counts them in the fixed size,
+    // which the toolkit set before it knew them: what the view lost then goes back
+    // into the size, once, so that a window manager that imposes sizes cannot make
+    // it grow without end.
+    const wxSize missing = m_fixedClientSize - GetClientSize();
+    if (!m_decorationsCounted && IsShown() && missing != wxSize() && !IsOnX11Display()) {
+        m_decorationsCounted = true;
+        SetMinSize(GetMinSize() + missing);
+        SetMaxSize(GetMaxSize() + missing);
+        SetSize(GetSize() + missing);
+    }
+    event.Skip();
 }

@@ -33,12 +33,16 @@ private:
     void OnHelpTool(wxCommandEvent& event);
     void OnCheckForUpdates(wxCommandEvent& event);
     void OnExitCommand(wxCommandEvent& event);
+    void OnSize(wxSizeEvent& event);
     void OnAbout(wxCommandEvent& event);
     void OnAboutModule(wxCommandEvent& event);
     void OnHowTo(wxCommandEvent& event);
     void OnClose(wxCloseEvent& event);
 
     wxBoxSizer* m_sizer;
+    // The client area the launcher picture needs, kept whatever the decorations take.
+    wxSize m_fixedClientSize;
+    bool m_decorationsCounted = false;
     Veltro3MainAppStandardView* m_standardView;
 
     wxDECLARE_EVENT_TABLE();

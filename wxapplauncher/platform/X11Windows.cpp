@@ -130,3 +130,9 @@ bool BringWindowToFront(const char* windowClass, const char* title)
     XCloseDisplay(display);
     return found;
 }
+
+bool IsOnX11Display()
+{
+    GdkDisplay* display = gdk_display_get_default();
+    return display && GDK_IS_X11_DISPLAY(display);
+}

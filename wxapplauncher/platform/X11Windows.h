@@ -6,3 +6,7 @@
 // given texts; raises, activates and focuses it. False when none is found or
 // there is no X11 display.
 bool BringWindowToFront(const char* windowClass, const char* title);
+
+// True when the toolkit runs on an X11 display (XWayland included), where the
+// window manager draws the decorations outside the window's size.
+bool IsOnX11Display();
