@@ -43,26 +43,32 @@ TEST(InstanceLockTest, TenCopiesAtOnceGiveOneAndAKilledCopyBlocksNone)
 
 TEST(InstanceLockTest, WithoutARuntimeDirATakenTmpFolderStillGivesOneCopy)
 {
-    // A /tmp of this test's own, so that the taken folder troubles nobody else.
+    // The taken folder is bound over /tmp/veltrona-<uid> in a mount namespace of this
+    // test's own, so that it troubles nobody else; /tmp itself may hold the build.
     if (unshare(CLONE_NEWNS) != 0)
         GTEST_SKIP() << "needs root";
     ASSERT_EQ(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr), 0);
-    ASSERT_EQ(mount("tmpfs", "/tmp", "tmpfs", 0, "mode=1777"), 0);
     StandinDir install({});
     const EnvList env = {{"XDG_RUNTIME_DIR", ""}, {"XDG_CACHE_HOME", install.Path() + "/cache"}};
-    const std::string taken = "/tmp/veltrona-" + std::to_string(getuid());
+    const std::string path = "/tmp/veltrona-" + std::to_string(getuid());
+    const std::string taken = install.Path() + "/taken";
+    const bool made = mkdir(path.c_str(), 0700) == 0;
     // Made first by another user, or open to others.
     for (const mode_t mode : {0700, 0755}) {
         ASSERT_EQ(mkdir(taken.c_str(), mode), 0);
         std::filesystem::permissions(taken, std::filesystem::perms(mode));
         ASSERT_EQ(chown(taken.c_str(), mode == 0700 ? 65534 : getuid(), -1), 0);
+        ASSERT_EQ(mount(taken.c_str(), path.c_str(), nullptr, MS_BIND, nullptr), 0);
         ProbeRun first(install.Path(), {}, env);
         ASSERT_TRUE(first.WaitForShown());
         ProbeRun second(install.Path(), {}, env);
         ASSERT_TRUE(second.WaitForExit());
         EXPECT_TRUE(second.Events("shown").empty());
+        umount(path.c_str());
         rmdir(taken.c_str());
     }
+    if (made)
+        rmdir(path.c_str());
 }
 
 } // namespace
