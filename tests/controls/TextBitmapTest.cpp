@@ -9,11 +9,21 @@
 namespace {
 
 wxImage Draw(const wxString& text, int points = 12, wxSize size = wxSize(-1, -1),
-             const wxColour& colour = *wxBLACK)
+             const wxColour& colour = *wxBLACK, wxPoint at = wxDefaultPosition)
 {
-    return DrawTextToBitmap(size, wxDefaultPosition, GetUIFont(points, wxNORMAL), text, colour, 0,
-                            0)
+    return DrawTextToBitmap(size, at, GetUIFont(points, wxNORMAL), text, colour,
+                            wxALIGN_CENTER_VERTICAL * (at.y != -1), 0)
         .ConvertToImage();
+}
+
+// The right-most column with any coverage, -1 for none.
+int LastInkColumn(const wxImage& image)
+{
+    for (int x = image.GetWidth() - 1; x >= 0; --x)
+        for (int y = 0; y < image.GetHeight(); ++y)
+            if (image.GetAlpha(x, y) > 0)
+                return x;
+    return -1;
 }
 
 wxBitmap Filled(const wxColour& colour, unsigned char alpha, int side = 8)
@@ -47,6 +57,11 @@ TEST(TextBitmapTest, DrawsText)
     EXPECT_EQ(Draw(text, 12, wxSize(Draw(text, 10).GetWidth() + 2, -1)).GetHeight(),
               Draw("a", 10).GetHeight());
     EXPECT_EQ(Draw(text, 12, wxSize(5, -1)).GetHeight(), Draw("a", 7).GetHeight());
+    // A label right of an icon shrinks to the room it has instead of being cut.
+    const wxImage label =
+        Draw(wxString::FromUTF8("Verknüpfung"), 12, wxSize(152, 58), *wxBLACK, wxPoint(70, 29));
+    EXPECT_GT(LastInkColumn(label), 70);
+    EXPECT_LT(LastInkColumn(label), 151);
 }
 
 TEST(TextBitmapTest, Composites)
