@@ -22,8 +22,7 @@ std::vector<ProbeEvent> ReadEventLog(const std::string& path);
 using Args = std::vector<std::string>;
 using EnvList = std::vector<std::pair<std::string, std::string>>;
 
-// How the launcher is started, when not by its full path from the test's own
-// working directory.
+// How the launcher is started, when not by its full path from the test's own working directory.
 struct ProbeStart
 {
     std::string program; // the file run; default <installDir>/Veltrona.exe
