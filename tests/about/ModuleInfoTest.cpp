@@ -1,6 +1,5 @@
-// The version reader over real PE files linked by the mingw tools and ELF files
-// carrying compiled resources; the About Modules lines and the module window on
-// the real display.
+// The version reader over real PE files linked by the mingw tools and ELF files carrying compiled
+// resources; the About Modules lines and the module window on the real display.
 #include "about/ModuleInfo.h"
 #include "about/ModuleSplash.h"
 #include "about/VersionInfo.h"

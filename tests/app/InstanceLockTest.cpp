@@ -24,8 +24,7 @@ TEST(InstanceLockTest, TenCopiesAtOnceGiveOneAndAKilledCopyBlocksNone)
         SCOPED_TRACE(round);
         std::vector<std::unique_ptr<ProbeRun>> copies;
         for (int i = 0; i < 10; ++i)
-            copies.push_back(
-                std::make_unique<ProbeRun>(install.Path(), std::vector<std::string>{}, env));
+            copies.push_back(std::make_unique<ProbeRun>(install.Path(), Args{}, env));
         // Nine end without a window; the one left runs.
         const auto ended = [](const auto& copy) { return copy->WaitForExit(0); };
         ASSERT_TRUE(WaitFor([&] { return std::count_if(copies.begin(), copies.end(), ended) >= 9; },

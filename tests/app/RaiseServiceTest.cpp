@@ -23,10 +23,7 @@
 
 namespace {
 
-using Args = std::vector<std::string>;
-
-// A socket connected to `path` (listening there when `listening`) that has
-// sent `bytes`.
+// A socket connected to `path` (listening there when `listening`) that has sent `bytes`.
 int OpenSocket(const std::string& path, const std::string& bytes, bool listening = false)
 {
     const int fd = socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
@@ -64,9 +61,7 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
                          {"VELTRONA_STANDIN_EXIT", "1"}};
     auto handOver = [&](const Args& args, bool delivered = true) {
         ProbeRun second(install.Path(), args, env, {"", "", profiles.Path()});
-        int status = 0;
-        EXPECT_TRUE(second.WaitForExit(10000, status));
-        EXPECT_EQ(WIFEXITED(status) && WEXITSTATUS(status) == 0, delivered) << status;
+        EXPECT_EQ(second.ExitCode(), delivered ? 0 : 1);
         EXPECT_TRUE(second.Events().empty()) << "a later copy shows nothing";
     };
 
@@ -77,8 +72,7 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
     ASSERT_TRUE(WaitFor([&] { return std::filesystem::is_socket(socket); }));
     handOver({"early.icc"});
     ASSERT_TRUE(first.WaitForShown());
-    // Relative to the later copy's folder, only the first argument, whole and
-    // never expanded.
+    // Relative to the later copy's folder, only the first argument, whole, never expanded.
     const std::string odd = "sub dir/a*b\\n\t" + std::string(2000, 'p') + "\n.icc";
     handOver({odd, "/ignored.icc"});
 
@@ -90,8 +84,7 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
     EXPECT_EQ(opened, expected);
 
     // Without a file, a later copy restores the minimised frame.
-    unsigned long frame = 0;
-    ASSERT_TRUE(WaitFor([&] { return (frame = WindowOf(first.Pid(), "Veltrona")) != 0; }));
+    const unsigned long frame = first.Window();
     MinimiseWindow(frame);
     ASSERT_TRUE(WaitFor([&] { return IsMinimised(frame); }));
     handOver({});
@@ -106,9 +99,8 @@ TEST(RaiseServiceTest, LaterCopiesRaiseTheFirstAndHandTheirFilesOver)
     EXPECT_EQ(SettledRecords(log).size(), expected.size());
 }
 
-// Peers that stall or lie, met while a help request waits for a viewer that
-// takes the connection and never answers: the launcher drops each of them, and
-// a later copy's file reaches Inspect meanwhile.
+// Peers that stall or lie, met while a help request waits for a viewer that never answers:
+// the launcher drops each of them, and a later copy's file reaches Inspect meanwhile.
 TEST(RaiseServiceTest, HostilePeersAndASlowViewerNeitherStallTheLauncherNorLoseAFile)
 {
     StandinDir install({"Quenta Inspect Studio.exe", "Help/Veltrona Help.exe"}), profiles({});
@@ -146,10 +138,7 @@ TEST(RaiseServiceTest, HostilePeersAndASlowViewerNeitherStallTheLauncherNorLoseA
         open.push_back(OpenSocket(peer.socket, peer.bytes));
         const std::string file = profiles.Path() + "/" + std::to_string(&peer - peers) + ".icc";
         files.insert({file});
-        ProbeRun second(install.Path(), {file}, env);
-        int status = 0;
-        ASSERT_TRUE(second.WaitForExit(10000, status));
-        EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status;
+        ASSERT_EQ(ProbeRun(install.Path(), {file}, env).ExitCode(), 0);
     }
     for (const StandinRecord& record : WaitForRecords(log, files.size() + 1)) // and the viewer's
         if (!record.args.empty())
@@ -162,9 +151,7 @@ TEST(RaiseServiceTest, HostilePeersAndASlowViewerNeitherStallTheLauncherNorLoseA
 
     // Its frame still closes with a silent peer connected, and the process ends.
     const int silent = OpenSocket(raise, "");
-    unsigned long frame = 0;
-    ASSERT_TRUE(WaitFor([&] { return (frame = WindowOf(first.Pid(), "Veltrona")) != 0; }));
-    CloseWindow(frame);
+    CloseWindow(first.Window());
     EXPECT_TRUE(first.WaitForExit());
     close(silent);
     close(viewer);

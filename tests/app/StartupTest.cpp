@@ -18,12 +18,9 @@
 #include <filesystem>
 #include <memory>
 #include <set>
-#include <sys/wait.h>
 #include <tuple>
 
 namespace {
-
-using Args = std::vector<std::string>;
 
 // The view's buttons: where they lie, their modules and icons. The first four labels have no
 // descenders; the second button lies under the pointer, at the screen's centre.
@@ -91,9 +88,8 @@ wxRect LabelInk(const wxImage& view, const wxPoint& button, double scale)
     return ink;
 }
 
-// The screen check counts the monitor's pixels against the preset and what the windows
-// need at the desktop's scale; the view and the splash are drawn at that scale; large
-// text fits its room.
+// The screen check counts the monitor's pixels against what the windows need at the
+// desktop's scale; the view and the splash are drawn at that scale; large text fits.
 TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
 {
     EnsureLauncherImages();
@@ -112,11 +108,8 @@ TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
     for (const auto& c : cases) {
         servers.push_back(std::make_unique<XvfbServer>(c.width, c.height));
         ASSERT_FALSE(servers.back()->Display().empty());
-        const std::string runtime = install.Path() + "/run" + std::to_string(runs.size());
-        std::filesystem::create_directory(runtime);
         runs.push_back(std::make_unique<ProbeRun>(install.Path(), Args{},
-                                                  EnvList{{"XDG_RUNTIME_DIR", runtime},
-                                                          {"DISPLAY", servers.back()->Display()},
+                                                  EnvList{{"DISPLAY", servers.back()->Display()},
                                                           {"LC_ALL", "C.UTF-8"},
                                                           {"GDK_SCALE", c.scale},
                                                           {"GDK_DPI_SCALE", c.textScale}}));
@@ -148,12 +141,9 @@ TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
     });
     wxImage views[5];
     for (size_t i = 0; i < runs.size(); ++i) {
-        SCOPED_TRACE(std::to_string(cases[i].width) + " x " + std::to_string(cases[i].height) +
-                     " at " + cases[i].scale + ", text at " + cases[i].textScale);
+        SCOPED_TRACE(i);
         if (cases[i].refusal) {
-            int status = 0;
-            ASSERT_TRUE(runs[i]->WaitForExit(20000, status));
-            EXPECT_FALSE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
+            EXPECT_GT(runs[i]->ExitCode(20000), 0);
             const auto events = runs[i]->Events();
             EXPECT_EQ(events.size(), 1u) << "one message, no window";
             EXPECT_EQ(events.at(0).fields[0], std::string("Please set your monitor to a supported "
@@ -174,20 +164,17 @@ TEST(StartupTest, ScreensOfEveryScaleAndTextSize)
             const wxPoint& at = kButtons[b].at;
             const wxRect ink = LabelInk(views[i], at, scale);
             EXPECT_LE(ink.GetRight(), (at.x + 152 - 2) * scale) << kButtons[b].icon;
-            if (b < 4) {
-                EXPECT_EQ(ink.GetBottom() - at.y * scale, first.GetBottom() - 68 * scale)
-                    << kButtons[b].icon;
-            }
+            EXPECT_TRUE(b >= 4 || ink.GetBottom() - at.y * scale == first.GetBottom() - 68 * scale)
+                << kButtons[b].icon;
         }
     }
 
     // The titles stay above their columns however large the text.
-    const wxImage art = LoadPicture("Veltro2AppFrame::LauncherBG", 1).ConvertToImage();
-    int inkPastColumn = 0;
-    for (int y = 15; y < 50; ++y)
-        for (int x = 557; x < 564; ++x)
-            inkPastColumn += Distance(views[4], x, y, art, x, y) > 150;
-    EXPECT_EQ(inkPastColumn, 0) << "\"Evaluate Profile\" runs past its column";
+    const wxRect pastColumn(557, 15, 7, 35);
+    EXPECT_TRUE(SamePixels(
+        views[4].GetSubImage(pastColumn),
+        LoadPicture("Veltro2AppFrame::LauncherBG", 1).ConvertToImage().GetSubImage(pastColumn), 50))
+        << "\"Evaluate Profile\" runs past its column";
 
     // At 200% the pictures are their 2x renderings, the labels drawn at that resolution.
     auto picture = [](const char* name, double scale, const wxRect& area) {
@@ -230,12 +217,9 @@ TEST(StartupTest, WorksFromItsOwnFolderAndOpensTheCallersFile)
     std::vector<std::unique_ptr<ProbeRun>> runs;
     std::multiset<Args> expected;
     for (const auto& c : cases) {
-        const std::string runtime = install + "/run" + std::to_string(runs.size());
-        std::filesystem::create_directory(runtime);
         runs.push_back(
             std::make_unique<ProbeRun>(install, c.args,
-                                       EnvList{{"XDG_RUNTIME_DIR", runtime},
-                                               {"VELTRONA_STANDIN_LOG", install + "/starts.log"},
+                                       EnvList{{"VELTRONA_STANDIN_LOG", install + "/starts.log"},
                                                {"VELTRONA_STANDIN_EXIT", "1"},
                                                {"PATH", install + ":" + std::getenv("PATH")}},
                                        c.start));
@@ -249,12 +233,8 @@ TEST(StartupTest, WorksFromItsOwnFolderAndOpensTheCallersFile)
         ASSERT_EQ(shown.size(), 2u);
         EXPECT_EQ(shown[0].fields[0], "");
         EXPECT_GE(std::stol(shown[1].fields[1]) - std::stol(shown[0].fields[1]), 2000);
-        unsigned long frame = 0;
-        ASSERT_TRUE(WaitFor([&] { return (frame = WindowOf(run->Pid(), "Veltrona")) != 0; }));
-        CloseWindow(frame);
-        int status = 0;
-        ASSERT_TRUE(run->WaitForExit(10000, status));
-        EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
+        CloseWindow(run->Window());
+        EXPECT_EQ(run->ExitCode(), 0);
         EXPECT_TRUE(run->Events("dialog").empty());
     }
 

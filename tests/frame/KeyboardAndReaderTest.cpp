@@ -52,13 +52,6 @@ std::vector<Button> Buttons()
     return buttons;
 }
 
-unsigned long LauncherWindow(const ProbeRun& run)
-{
-    unsigned long window = 0;
-    WaitFor([&] { return (window = WindowOf(run.Pid(), "Veltrona")) != 0; });
-    return window;
-}
-
 TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
 {
     // A session bus of the test's own, where the accessibility bus starts.
@@ -109,9 +102,8 @@ TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
         EXPECT_TRUE(atspi_action_do_action(action, 0, nullptr));
         expectStarted(3);
 
-        // Tab walks the buttons in reading order, round and round; Space presses
-        // the focused Printer button, Return the next one, Monitor.
-        const unsigned long window = LauncherWindow(run);
+        // Tab walks the buttons in reading order, round and round; Space presses Printer.
+        const unsigned long window = run.Window();
         std::string focused;
         auto tab = [&] {
             const std::string before = focused;
@@ -160,16 +152,15 @@ wxImage SettledView(unsigned long window)
 TEST(KeyboardAndReaderTest, ViewPaintsUnderEveryInputMethod)
 {
     StandinDir install(kModules);
-    // GTK's X input method needs no server: Xlib opens its local one. The launcher
-    // picture left of the buttons is the same in every language.
-    const wxRect picture(0, 2, 200, 290);
+    // GTK's X input method needs no server: Xlib opens its local one.
+    const wxRect picture(0, 2, 200, 290); // the same in every language
     wxImage english, simple;
     std::system("xdotool mousemove 0 0");
     for (const char* lang : {"en_US.UTF-8", "ja_JP.UTF-8", "zh_CN.UTF-8"})
         for (const std::string inputMethod : {"simple", "xim"}) {
             ProbeRun run(install.Path(), {}, {{"LANG", lang}, {"GTK_IM_MODULE", inputMethod}});
             ASSERT_TRUE(run.WaitForShown()) << lang;
-            const unsigned long window = LauncherWindow(run);
+            const unsigned long window = run.Window();
             TypeKeys(window, "Tab");
             const wxImage view = SettledView(window);
             if (!english.IsOk())

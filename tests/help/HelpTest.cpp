@@ -33,8 +33,7 @@ TEST(ContextualHelpTest, HelpCommandShowsTheLauncherPageInTheViewer)
         const std::string starts = install.Path() + "/starts.log",
                           log = install.Path() + "/viewer.log";
         ProbeRun launcher(install.Path(), {},
-                          {{"XDG_RUNTIME_DIR", install.Path()},
-                           {"VELTRONA_STANDIN_LOG", starts},
+                          {{"VELTRONA_STANDIN_LOG", starts},
                            {"VELTRONA_HELP_LOG", log},
                            {"VELTRONA_PROBE_COMMAND", "1015"}});
         ASSERT_TRUE(WaitFor([&] { return launcher.Events("command").size() == 2; }, 30000));
@@ -111,7 +110,6 @@ TEST(HelpToolTest, StatusesFollowThePagesOfTheUsersLanguage)
                           {{"LANG", c.lang + std::string(".UTF-8")},
                            {"LC_ALL", ""},
                            {"LC_MESSAGES", ""},
-                           {"XDG_RUNTIME_DIR", install.Path()},
                            {"VELTRONA_PROBE_COMMAND", "1018"}});
         ASSERT_TRUE(WaitFor([&] { return launcher.Events("command").size() == 2; }, 30000));
         const auto dialogs = launcher.Events("dialog");

@@ -26,14 +26,13 @@ struct RuntimeDir
 TEST(IpcTest, SocketsOnlyInAPrivateDirectoryAndOnlyWhereTheyFit)
 {
     const size_t room = sizeof(sockaddr_un::sun_path) - 2 - RuntimeDir().Sockets().size();
-    struct Case
+    const struct
     {
         mode_t folderMode; // 0: the folder is made by the layer
         bool link, foreign;
         std::string name;
         bool accepted;
-    };
-    const Case cases[] = {
+    } cases[] = {
         {0, false, false, "Help", true},
         {0, false, false, "", false},
         {0, false, false, "../Help", false},
@@ -43,7 +42,7 @@ TEST(IpcTest, SocketsOnlyInAPrivateDirectoryAndOnlyWhereTheyFit)
         {0750, false, false, "Help", false},
         {0700, false, true, "Help", false},
     };
-    for (const Case& c : cases) {
+    for (const auto& c : cases) {
         SCOPED_TRACE(testing::Message() << &c - cases);
         const RuntimeDir runtime;
         const std::string folder = runtime.Sockets() + (c.link ? "-real" : "");

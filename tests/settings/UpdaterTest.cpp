@@ -75,7 +75,6 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
             fs::permissions(user, fs::perms(0444));
         if (!test.system.empty())
             install.Write("etc" + kSettings, test.system);
-        const wxString oldDir = wxGetCwd();
         wxSetWorkingDirectory(root);
         CheckForUpdateAtLaunch();
         const auto atLaunch = SettledRecords(log);
@@ -83,7 +82,6 @@ TEST(UpdaterTest, ScheduleAndSilentMark)
         const auto all = SettledRecords(log);
         // The launcher reads what the updater reads.
         const wxString silent = CProfileConfig("Zel Updater").ReadString("Silent", "none");
-        wxSetWorkingDirectory(oldDir);
 
         ASSERT_EQ(atLaunch.size(), test.starts ? 1u : 0u);
         ASSERT_EQ(all.size(), atLaunch.size() + 1);
@@ -113,8 +111,7 @@ TEST(UpdaterTest, StartUpRemovesLeftoversAndStartsADueUpdate)
     install.Write("config" + kSettings, "Silent=0\n");
 
     ProbeRun launcher(root, {},
-                      {{"XDG_RUNTIME_DIR", root},
-                       {"XDG_CONFIG_HOME", root + "/config"},
+                      {{"XDG_CONFIG_HOME", root + "/config"},
                        {"TMPDIR", tmp},
                        {"VELTRONA_STANDIN_LOG", log},
                        {"VELTRONA_STANDIN_EXIT", "1"}});

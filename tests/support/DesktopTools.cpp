@@ -56,12 +56,7 @@ wxImage ScreenPixels(const wxRect& rect, const std::string& displayName)
                               rect.height, AllPlanes, ZPixmap);
     if (image) {
         auto channel = [](unsigned long pixel, unsigned long mask) {
-            int shift = 0;
-            while (mask && !(mask & 1)) {
-                mask >>= 1;
-                ++shift;
-            }
-            return static_cast<unsigned char>(((pixel >> shift) & mask) * 255 / (mask ? mask : 1));
+            return static_cast<unsigned char>((pixel & mask) * 255 / mask);
         };
         for (int y = 0; y < rect.height; ++y)
             for (int x = 0; x < rect.width; ++x) {
@@ -73,18 +68,6 @@ wxImage ScreenPixels(const wxRect& rect, const std::string& displayName)
     }
     XCloseDisplay(display);
     return pixels;
-}
-
-wxSize WindowSize(unsigned long window)
-{
-    wxSize size;
-    if (Display* display = XOpenDisplay(nullptr)) {
-        XWindowAttributes attributes;
-        if (XGetWindowAttributes(display, window, &attributes))
-            size = wxSize(attributes.width, attributes.height);
-        XCloseDisplay(display);
-    }
-    return size;
 }
 
 bool SamePixels(const wxImage& a, const wxImage& b, int tolerance)
@@ -108,16 +91,15 @@ bool IsMinimised(unsigned long window)
 wxRect WindowRect(unsigned long window)
 {
     wxRect rect;
-    Display* display = XOpenDisplay(nullptr);
-    if (!display)
-        return rect;
-    XWindowAttributes attributes;
-    Window child;
-    if (XGetWindowAttributes(display, window, &attributes) &&
-        XTranslateCoordinates(display, window, DefaultRootWindow(display), 0, 0, &rect.x, &rect.y,
-                              &child))
-        rect.SetSize(wxSize(attributes.width, attributes.height));
-    XCloseDisplay(display);
+    if (Display* display = XOpenDisplay(nullptr)) {
+        XWindowAttributes attributes;
+        Window child;
+        if (XGetWindowAttributes(display, window, &attributes) &&
+            XTranslateCoordinates(display, window, DefaultRootWindow(display), 0, 0, &rect.x,
+                                  &rect.y, &child))
+            rect.SetSize(wxSize(attributes.width, attributes.height));
+        XCloseDisplay(display);
+    }
     return rect;
 }
 

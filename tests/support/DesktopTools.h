@@ -7,7 +7,6 @@
 
 class wxImage;
 class wxRect;
-class wxSize;
 
 // The window manager's active window, 0 when there is none.
 unsigned long ActiveWindow();
@@ -16,9 +15,8 @@ unsigned long WindowOf(pid_t pid, const std::string& title);
 void CloseWindow(unsigned long window);
 void MinimiseWindow(unsigned long window);
 bool IsMinimised(unsigned long window);
-// The size of the window itself, without the window manager's frame; (0, 0) if none.
-wxSize WindowSize(unsigned long window);
-// Where the window lies on the screen, in root coordinates; empty if it is gone.
+// Where the window itself (without the window manager's frame) lies on the
+// screen, in root coordinates; empty if it is gone.
 wxRect WindowRect(unsigned long window);
 // Activates the window and types `keys` (xdotool key names) through XTest.
 void TypeKeys(unsigned long window, const std::string& keys);

@@ -1,12 +1,10 @@
-// The real launcher with two recorders added, for process-level tests: every
-// modal dialog (answered with OK, never shown) and every top-level window that
-// is shown are appended to the file named by VELTRONA_PROBE_LOG (a dialog that
-// is no message box also with the texts of its controls, one per line); a shown
-// window's client area follows as a "placed" event (title, then x, y, width and
-// height in the screen's physical pixels). With
-// VELTRONA_PROBE_COMMAND=<id>, the menu command <id> goes to the top window
-// once it is first shown, and its start and end are recorded as "command"
-// events (id, then milliseconds since the probe started).
+// The real launcher with two recorders added, for process-level tests: every modal dialog
+// (answered with OK, never shown) and every top-level window that is shown are appended to the
+// file named by VELTRONA_PROBE_LOG (a dialog that is no message box also with the texts of its
+// controls, one per line); a shown window's client area follows as a "placed" event (title,
+// then x, y, width and height in the screen's physical pixels). With VELTRONA_PROBE_COMMAND=<id>,
+// the menu command <id> goes to the top window once it is first shown, and its start and end
+// are recorded as "command" events (id, then milliseconds since the probe started).
 #include "DialogRecorder.h"
 #include "StandinRecord.h"
 #include "app/Veltro3App.h"

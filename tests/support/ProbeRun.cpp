@@ -1,5 +1,6 @@
 #include "support/ProbeRun.h"
 
+#include "support/DesktopTools.h"
 #include "support/GuiWait.h"
 #include "support/ScopedEnv.h"
 #include "support/StandinLog.h"
@@ -22,8 +23,8 @@ int g_probeCount = 0;
 
 } // namespace
 
-ProbeRun::ProbeRun(const std::string& installDir, const std::vector<std::string>& args,
-                   const EnvList& env, const ProbeStart& start)
+ProbeRun::ProbeRun(const std::string& installDir, const Args& args, const EnvList& env,
+                   const ProbeStart& start)
 {
     namespace fs = std::filesystem;
     const fs::path launcher = fs::path(installDir) / "Veltrona.exe";
@@ -38,7 +39,9 @@ ProbeRun::ProbeRun(const std::string& installDir, const std::vector<std::string>
     m_log = installDir + "/probe-" + std::to_string(getpid()) + "-" +
             std::to_string(++g_probeCount) + ".log";
 
-    EnvList environment = env;
+    EnvList environment = {{"XDG_RUNTIME_DIR", m_log + ".run"}};
+    fs::create_directory(environment[0].second);
+    environment.insert(environment.end(), env.begin(), env.end());
     environment.emplace_back("VELTRONA_PROBE_LOG", m_log);
     const ScopedEnv scoped(environment);
 
@@ -112,19 +115,26 @@ bool ProbeRun::WaitForShown(int timeoutMs) const
         timeoutMs);
 }
 
-bool ProbeRun::WaitForExit(int timeoutMs, int& status)
+unsigned long ProbeRun::Window() const
 {
-    if (m_pid > 0 && !m_reaped)
-        m_reaped =
-            WaitFor([this] { return waitpid(m_pid, &m_status, WNOHANG) == m_pid; }, timeoutMs);
-    status = m_status;
-    return m_reaped;
+    unsigned long window = 0;
+    WaitFor([&] { return (window = WindowOf(m_pid, "Veltrona")) != 0; });
+    return window;
 }
 
 bool ProbeRun::WaitForExit(int timeoutMs)
 {
-    int status = 0;
-    return WaitForExit(timeoutMs, status);
+    if (m_pid > 0 && !m_reaped)
+        m_reaped =
+            WaitFor([this] { return waitpid(m_pid, &m_status, WNOHANG) == m_pid; }, timeoutMs);
+    return m_reaped;
+}
+
+int ProbeRun::ExitCode(int timeoutMs)
+{
+    if (!WaitForExit(timeoutMs))
+        return -1;
+    return WIFEXITED(m_status) ? WEXITSTATUS(m_status) : 256 + WTERMSIG(m_status);
 }
 
 void ProbeRun::Kill(int signal)

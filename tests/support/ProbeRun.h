@@ -19,10 +19,10 @@ struct ProbeEvent
 // (the probe's log, the help viewer stand-in's log).
 std::vector<ProbeEvent> ReadEventLog(const std::string& path);
 
+using Args = std::vector<std::string>;
 using EnvList = std::vector<std::pair<std::string, std::string>>;
 
-// How the launcher is started, when not by its full path from the test's own
-// working directory.
+// How the launcher is started, when not by its full path from the test's own working directory.
 struct ProbeStart
 {
     std::string program; // the file run; default <installDir>/Veltrona.exe
@@ -33,12 +33,12 @@ struct ProbeStart
 class ProbeRun
 {
 public:
-    // Runs `<installDir>/Veltrona.exe`, the probe (a hard link, so that the
-    // launcher finds itself there), with `args` and the test's environment plus
-    // `env`. Stand-ins it starts become children of the test once it ends, so
-    // SettledRecords waits for them too.
-    ProbeRun(const std::string& installDir, const std::vector<std::string>& args,
-             const EnvList& env = {}, const ProbeStart& start = {});
+    // Runs `<installDir>/Veltrona.exe`, the probe (a hard link, so that the launcher finds
+    // itself there), with `args` and the test's environment plus `env`, in an XDG_RUNTIME_DIR
+    // of its own unless `env` names one. Stand-ins it starts become children of the test
+    // once it ends, so SettledRecords waits for them too.
+    ProbeRun(const std::string& installDir, const Args& args, const EnvList& env = {},
+             const ProbeStart& start = {});
     ~ProbeRun();
     ProbeRun(const ProbeRun&) = delete;
     ProbeRun& operator=(const ProbeRun&) = delete;
@@ -49,9 +49,12 @@ public:
 
     // Until the main frame is shown.
     bool WaitForShown(int timeoutMs = 20000) const;
-    // True once the process has ended; its wait status is in `status`.
-    bool WaitForExit(int timeoutMs, int& status);
+    // Its frame's X window once visible, 0 if none shows.
+    unsigned long Window() const;
+    // True once the process has ended.
     bool WaitForExit(int timeoutMs = 10000);
+    // Its exit status once it has ended, 256 + the signal that ended it, -1 if it runs on.
+    int ExitCode(int timeoutMs = 10000);
     void Kill(int signal);
 
 private:

@@ -28,8 +28,7 @@ std::vector<StandinRecord> ReadRecords(const std::string& path);
 std::vector<StandinRecord> WaitForRecords(const std::string& path, size_t count,
                                           int timeoutMs = 10000);
 
-// Every record, once all the stand-ins this process started (but `except`)
-// have ended: a stand-in writes its record before it ends, so nothing started
-// so far is missing, whatever order the records were written in.
+// Every record, once all the stand-ins this process started (but `except`) have ended: a
+// stand-in writes its record before it ends, so nothing started so far is missing.
 std::vector<StandinRecord> SettledRecords(const std::string& path, pid_t except = 0,
                                           int timeoutMs = 10000);

@@ -44,26 +44,19 @@ WestonServer::WestonServer(int width, int height, bool xwayland)
                                    "--height=" + std::to_string(height), "--log=" + log,
                                    std::string("--socket=") + Socket()};
     // The child of a threaded process may only exec: its environment is made here.
-    std::vector<std::string> env{"XDG_RUNTIME_DIR=" + m_runtimeDir};
+    const std::string runtime = "XDG_RUNTIME_DIR=" + m_runtimeDir;
+    std::vector<const char*> envp{runtime.c_str()};
     for (char** var = environ; *var; ++var)
         if (std::strncmp(*var, "XDG_RUNTIME_DIR=", 16) != 0)
-            env.emplace_back(*var);
-    std::vector<char*> envp;
-    for (std::string& var : env)
-        envp.push_back(var.data());
+            envp.push_back(*var);
     envp.push_back(nullptr);
-    const char* argv[] = {"weston",
-                          "--backend=headless-backend.so",
-                          "--no-config",
-                          options[0].c_str(),
-                          options[1].c_str(),
-                          options[2].c_str(),
-                          options[3].c_str(),
-                          xwayland ? "--xwayland" : nullptr,
-                          nullptr};
+    std::vector<const char*> argv = {"weston", "--backend=headless-backend.so", "--no-config"};
+    for (const std::string& option : options)
+        argv.push_back(option.c_str());
+    argv.insert(argv.end(), {xwayland ? "--xwayland" : nullptr, nullptr});
     m_pid = fork();
     if (m_pid == 0) {
-        execvpe("weston", const_cast<char**>(argv), envp.data());
+        execvpe("weston", const_cast<char**>(argv.data()), const_cast<char**>(envp.data()));
         _exit(127);
     }
 

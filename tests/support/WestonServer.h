@@ -1,6 +1,5 @@
-// A private headless Wayland compositor (weston), with or without XWayland, for
-// tests that run the launcher on a Wayland desktop. Headless weston has no input
-// seat.
+// A private headless Wayland compositor (weston), with or without XWayland, for tests that run the
+// launcher on a Wayland desktop. Headless weston has no input seat.
 #pragma once
 
 #include <string>
