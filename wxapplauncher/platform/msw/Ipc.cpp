@@ -254,6 +254,9 @@ bool IpcConnection::DoPoke(const wxString& item, const void* data, size_t size, 
     }
     const std::wstring name = item.ToStdWstring();
     const Clock::time_point deadline = m_channel->Deadline();
+    // Every poke asks its peer to show something (the running copy's frame, a
+    // help page): the peer may take the foreground.
+    AllowSetForegroundWindow(ASFW_ANY);
     return m_channel->Run([name, payload, clipboardFormat, deadline](DWORD instance,
                                                                      HCONV& conversation) {
         const StringHandle itemHandle(instance, name);
