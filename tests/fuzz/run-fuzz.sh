@@ -14,6 +14,7 @@ mkdir -p "$work/corpus" "$work/artifacts"
 clang++ -std=c++17 -g -O1 -fsanitize=fuzzer,address,undefined -fno-sanitize-recover=all \
     $(wx-config --cxxflags) -I "$src/wxapplauncher" "$src/tests/fuzz/ResourceFuzz.cpp" \
     "$src"/wxapplauncher/platform/{ResourceImage,IconResource,PeResource,VersionResource}.cpp \
+    "$src"/wxapplauncher/platform/unix/ElfResources.cpp \
     "$src"/wxapplauncher/resources/{CatalogFormat,IconBundle}.cpp \
     $(wx-config --libs core,base) -o "$work/resource_fuzz"
 cp "$res" "$work/corpus/Veltrona.res"

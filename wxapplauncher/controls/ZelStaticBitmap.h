@@ -56,6 +56,7 @@ public:
     virtual void OnSetFocus(wxFocusEvent& event);
     virtual void OnKeyDown(wxKeyEvent& event);
     virtual void OnCaptureLost(wxMouseCaptureLostEvent& event);
+    virtual void OnWindowCreate(wxWindowCreateEvent& event);
 
     bool Enable(bool enable = true) override;
     bool SetBackgroundColour(const wxColour& colour) override;
@@ -65,8 +66,6 @@ public:
 
     // Sends the button-click command event, as a click with the mouse does.
     void Click();
-
-    void GTKHandleRealized() override;
 
 protected:
     wxSize DoGetBestSize() const override;

@@ -4,7 +4,7 @@
 #include "frame/Ids.h"
 #include "instrument/MeasuringTable.h"
 #include "platform/ProcessStart.h"
-#include "platform/X11Windows.h"
+#include "platform/WindowActivation.h"
 
 #include <wx/filename.h>
 #include <wx/msgdlg.h>

@@ -1,8 +1,8 @@
 #include "help/Documentation.h"
 
-#include "app/UserLanguage.h"
 #include "help/CAcrobatNotFoundDialog.h"
-#include "help/DesktopOpen.h"
+#include "platform/DesktopOpen.h"
+#include "platform/UserLanguage.h"
 
 #include <wx/app.h>
 #include <wx/dir.h>

@@ -4,8 +4,14 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <string>
 #include <vector>
+
+// VS_VERSION_INFO is resource 1 of the version type; a version block cannot be
+// longer than its 16-bit length field says.
+constexpr std::uint16_t kVersionResourceName = 1;
+constexpr std::size_t kMaxVersionBlock = 0xFFFF;
 
 enum class VersionResourceResult
 {

@@ -1,7 +1,7 @@
 #include "platform/Ipc.h"
 
-#include "platform/IpcWire.h"
 #include "platform/LittleEndian.h"
+#include "platform/unix/IpcWire.h"
 
 #include <wx/evtloop.h>
 #include <wx/evtloopsrc.h>
@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <chrono>
 #include <cstring>
 #include <string>
 #include <sys/socket.h>
