@@ -2,6 +2,7 @@
 
 #include <windows.h>
 
+#include <dde.h>
 #include <ddeml.h>
 
 #include <algorithm>
@@ -34,20 +35,22 @@ DWORD MillisecondsLeft(Clock::time_point deadline)
     return left > 0 ? static_cast<DWORD>(left) : 0;
 }
 
-// Waits for `event` until the deadline, handling the messages sent to this
-// thread's windows meanwhile: connecting asks every top-level window, this
-// thread's own included, and waits for each answer.
-bool WaitServingSentMessages(HANDLE event, Clock::time_point deadline)
+// Waits for `event` until the deadline while this thread goes on answering
+// DDE: connecting asks every top-level window, this thread's own included, and
+// waits for each answer; a server of this thread sees pokes only as posted
+// messages. Nothing else is dispatched meanwhile.
+bool WaitServingDde(HANDLE event, Clock::time_point deadline)
 {
     for (;;) {
-        const DWORD woke =
-            MsgWaitForMultipleObjectsEx(1, &event, MillisecondsLeft(deadline), QS_SENDMESSAGE, 0);
+        const DWORD woke = MsgWaitForMultipleObjectsEx(1, &event, MillisecondsLeft(deadline),
+                                                       QS_SENDMESSAGE | QS_POSTMESSAGE, 0);
         if (woke == WAIT_OBJECT_0)
             return true;
         if (woke != WAIT_OBJECT_0 + 1)
             return false;
         MSG message;
-        PeekMessageW(&message, nullptr, 0, 0, PM_NOREMOVE | PM_QS_SENDMESSAGE);
+        while (PeekMessageW(&message, nullptr, WM_DDE_FIRST, WM_DDE_LAST, PM_REMOVE))
+            DispatchMessageW(&message);
     }
 }
 
@@ -95,7 +98,7 @@ public:
     ~IpcChannel()
     {
         Finish();
-        WaitServingSentMessages(m_shared->ended, m_deadline);
+        WaitServingDde(m_shared->ended, m_deadline);
     }
 
     IpcChannel(const IpcChannel&) = delete;
@@ -124,7 +127,7 @@ public:
             m_shared->step = std::move(step);
         }
         SetEvent(m_shared->wake);
-        if (!WaitServingSentMessages(m_shared->done, m_deadline)) {
+        if (!WaitServingDde(m_shared->done, m_deadline)) {
             Finish();
             return false;
         }
@@ -251,16 +254,21 @@ bool IpcConnection::DoPoke(const wxString& item, const void* data, size_t size, 
     }
     const std::wstring name = item.ToStdWstring();
     const Clock::time_point deadline = m_channel->Deadline();
+    // Every poke asks its peer to show something (the running copy's frame, a
+    // help page): the peer may take the foreground.
+    AllowSetForegroundWindow(ASFW_ANY);
     return m_channel->Run([name, payload, clipboardFormat, deadline](DWORD instance,
                                                                      HCONV& conversation) {
         const StringHandle itemHandle(instance, name);
         DWORD status = 0;
         // The system's own timeout ends a transaction the caller gave up on.
+        // The server's answer is in the status: Wine reports success either way.
         return itemHandle.Get() &&
                DdeClientTransaction(
                    const_cast<unsigned char*>(payload.data()), static_cast<DWORD>(payload.size()),
                    conversation, itemHandle.Get(), clipboardFormat, XTYP_POKE,
-                   std::max<DWORD>(MillisecondsLeft(deadline), 1), &status) != nullptr;
+                   std::max<DWORD>(MillisecondsLeft(deadline), 1), &status) != nullptr &&
+               (status & DDE_FACK) != 0;
     });
 }
 
