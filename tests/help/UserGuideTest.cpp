@@ -11,6 +11,7 @@
 #include "support/StandinLog.h"
 
 #include <gtest/gtest.h>
+#include <wx/timer.h>
 #include <wx/uiaction.h>
 
 #include <filesystem>
@@ -146,6 +147,28 @@ TEST(UserGuideTest, ReaderLinkOpensItsAddressOrSaysWhyNot)
     pointer.MouseClick();
     ASSERT_TRUE(WaitFor([&] { return !dialogs.Dialogs().empty(); }));
     EXPECT_EQ(dialogs.Dialogs()[0].message, "Failed to open the URL");
+}
+
+// Real key presses on the shown dialog: the picture never has the focus, so Return
+// ends it as OK does, Escape as a cancel.
+TEST(UserGuideTest, ReaderDialogEndsWithReturnOrEscape)
+{
+    for (const auto& [key, result] :
+         {std::pair{WXK_RETURN, int(wxID_OK)}, std::pair{WXK_ESCAPE, int(wxID_CANCEL)}}) {
+        SCOPED_TRACE(key);
+        CAcrobatNotFoundDialog dialog(nullptr);
+        wxWindow* focused = nullptr;
+        dialog.CallAfter([&] {
+            ASSERT_TRUE(WaitFor([&] { return dialog.IsActive(); })) << "the dialog's activation";
+            focused = wxWindow::FindFocus();
+            wxUIActionSimulator().Char(key);
+        });
+        wxTimer guard;
+        guard.Bind(wxEVT_TIMER, [&](wxTimerEvent&) { dialog.EndModal(-1); });
+        guard.StartOnce(10000);
+        EXPECT_EQ(dialog.ShowModal(), result);
+        EXPECT_EQ(focused, dialog.FindWindow(140));
+    }
 }
 
 } // namespace
