@@ -20,6 +20,7 @@ packages=(
     weston
     xwayland
     xdotool
+    adwaita-icon-theme
     x11-utils
     wmctrl
     imagemagick
