@@ -1,10 +1,10 @@
 #include "app/Veltro3App.h"
 
-#include <wx/display.h>
-#include <wx/msgdlg.h>
-#include <wx/settings.h>
+#include "platform/InputSeat.h"
+#include "platform/MessageBox.h"
 
-#include <gdk/gdk.h>
+#include <wx/display.h>
+#include <wx/settings.h>
 
 #include <algorithm>
 
@@ -24,15 +24,6 @@ const Resolution kResolutionPresets[] = {
 // What the launcher's windows take on the screen, in logical pixels: the frame (its
 // 564 x 344 view under the menu bar), the start-up splash and the About box.
 const wxSize kWindowSizes[] = {{564, 369}, {445, 425}, {443, 454}};
-
-// A Wayland display may have no input seat at all (a headless or kiosk compositor). GTK's
-// message box first releases the pointer, which GDK then looks up on the missing seat and
-// crashes; and no one could answer the box there anyway.
-bool HasInputSeat()
-{
-    GdkDisplay* display = gdk_display_get_default();
-    return display && gdk_display_get_default_seat(display);
-}
 
 } // namespace
 
@@ -62,7 +53,7 @@ bool Veltro3App::CheckScreenResolution(int preset)
         return true;
 
     if (HasInputSeat())
-        wxMessageBox(
+        ShowMessageBox(
             wxString::Format(
                 _("Please set your monitor to a supported resolution.\nMinimum required: %d x %d"),
                 width, height),
