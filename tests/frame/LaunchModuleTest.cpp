@@ -1,8 +1,8 @@
 // Module launching beyond a plain click: drops, missing modules, Verify's language and copy.
-#include "app/UserLanguage.h"
 #include "frame/DragNDrop.h"
 #include "frame/Veltro3AppFrame.h"
 #include "frame/Veltro3MainAppStandardView.h"
+#include "platform/UserLanguage.h"
 
 #include "support/DesktopTools.h"
 #include "support/DialogRecorder.h"

@@ -3,7 +3,7 @@
 // poke may run more of the script nested inside it, as a dialog's event loop in OnPoke does.
 // Every limit is checked as it could be broken, and each peer's outcome against the same
 // bytes handed to a fresh peer in one piece.
-#include "platform/IpcPeer.h"
+#include "platform/unix/IpcPeer.h"
 
 #include <wx/init.h>
 #include <wx/log.h>

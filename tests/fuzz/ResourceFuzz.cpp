@@ -5,6 +5,7 @@
 #include "platform/IconResource.h"
 #include "platform/ResourceImage.h"
 #include "platform/VersionResource.h"
+#include "platform/unix/ElfResources.h"
 #include "resources/CatalogFormat.h"
 #include "resources/IconBundle.h"
 

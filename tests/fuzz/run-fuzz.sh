@@ -28,9 +28,11 @@ fuzz() {
 
 build resource_fuzz "$src/tests/fuzz/ResourceFuzz.cpp" \
     "$src"/wxapplauncher/platform/{ResourceImage,IconResource,PeResource,VersionResource}.cpp \
+    "$src"/wxapplauncher/platform/unix/ElfResources.cpp \
     "$src"/wxapplauncher/resources/{CatalogFormat,IconBundle}.cpp
 build ipc_fuzz "$src/tests/fuzz/IpcFuzz.cpp" \
-    "$src"/wxapplauncher/platform/{IpcPeer,Ipc,PrivateRuntimeDir}.cpp
+    "$src"/wxapplauncher/platform/PokeText.cpp \
+    "$src"/wxapplauncher/platform/unix/{IpcPeer,Ipc,PrivateRuntimeDir}.cpp
 
 cp "$res" "$work/corpus/Veltrona.res"
 cp "$src"/tests/fuzz/seeds/resource/* "$work/corpus/"

@@ -1,9 +1,10 @@
 // The embedded resources: the reader and icon decoding over the real executable and
 // damaged copies, the frame's window icons, and the catalogues.
-#include "app/UserLanguage.h"
 #include "frame/Veltro3AppFrame.h"
 #include "platform/IconResource.h"
 #include "platform/ResourceImage.h"
+#include "platform/UserLanguage.h"
+#include "platform/unix/ElfResources.h"
 #include "resources/CatalogFormat.h"
 #include "resources/Catalogs.h"
 #include "resources/IconBundle.h"

@@ -25,8 +25,8 @@ bool HandOverToRunningCopy(const wxString& service, const wxString& path)
     const auto start = Clock::now();
     wxLogNull quiet;
 
-    // A refused socket path stays refused: nothing to wait for.
-    if (GetServiceSocketPath(service).empty())
+    // A refused service name stays refused: nothing to wait for.
+    if (!IsServiceNameUsable(service))
         return false;
     IpcClient client;
     std::unique_ptr<wxConnectionBase> connection;

@@ -1,6 +1,6 @@
 #include "app/Veltro3App.h"
 
-#include "platform/InputSeat.h"
+#include "platform/DisplaySession.h"
 #include "platform/MessageBox.h"
 
 #include <wx/display.h>

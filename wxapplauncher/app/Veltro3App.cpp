@@ -3,13 +3,13 @@
 #include "about/Splash.h"
 #include "app/CommandLineFile.h"
 #include "app/HandOver.h"
-#include "app/UserLanguage.h"
 #include "app/Veltro3AppLauncherIPC.h"
 #include "frame/Veltro3AppFrame.h"
 #include "help/CContextualHelp.h"
 #include "help/HelpTool.h"
-#include "platform/InputSeat.h"
+#include "platform/DisplaySession.h"
 #include "platform/InstanceLock.h"
+#include "platform/UserLanguage.h"
 #include "resources/Catalogs.h"
 #include "settings/UpdateCheck.h"
 
@@ -21,8 +21,6 @@
 #include <wx/stdpaths.h>
 #include <wx/timer.h>
 #include <wx/utils.h>
-
-#include <gdk/gdk.h>
 
 namespace {
 const int kSplashMilliseconds = 2000;
@@ -51,13 +49,9 @@ Veltro3App::~Veltro3App() = default;
 
 bool Veltro3App::Initialize(int& argc, wxChar** argv)
 {
-    // The desktop entry's name: the Wayland app_id and the X11 instance name (its class
-    // stays "Veltrona", the entry's StartupWMClass).
-    g_set_prgname("veltrona");
-    // The frame's fixed size and the Verify raise need X11, so on a Wayland session the
-    // launcher runs through XWayland when it can. This process only: the modules inherit no
-    // GDK_BACKEND, and a user's GDK_BACKEND still wins.
-    gdk_set_allowed_backends("x11,*");
+    // The desktop entry's name; the frame's fixed size and the Verify raise need X11 where
+    // the session offers it.
+    PrepareToolkit("veltrona");
     return wxApp::Initialize(argc, argv);
 }
 

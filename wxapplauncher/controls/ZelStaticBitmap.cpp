@@ -1,6 +1,6 @@
 #include "controls/ZelStaticBitmap.h"
 
-#include "controls/ButtonAccessible.h"
+#include "platform/ButtonAccessibility.h"
 #include "platform/KeyboardFocus.h"
 
 #include <wx/dcclient.h>
@@ -45,6 +45,7 @@ wxBEGIN_EVENT_TABLE(ZelStaticBitmap, wxControl)
     EVT_SET_FOCUS(ZelStaticBitmap::OnSetFocus)
     EVT_KEY_DOWN(ZelStaticBitmap::OnKeyDown)
     EVT_MOUSE_CAPTURE_LOST(ZelStaticBitmap::OnCaptureLost)
+    EVT_WINDOW_CREATE(ZelStaticBitmap::OnWindowCreate)
 wxEND_EVENT_TABLE()
 // clang-format on
 
@@ -58,7 +59,8 @@ ZelStaticBitmap::ZelStaticBitmap(wxWindow* parent, wxWindowID id, const wxBitmap
     wxControl::Create(parent, id, pos, size, style, wxDefaultValidator, name);
     SetBitmap(bitmap);
     SetInitialSize(size);
-    ExposeAsButton(this);
+    ExposeAsButton(this, {[this] { return !GetLabel().empty(); }, [this] { return GetLabelText(); },
+                          [this] { Click(); }});
 }
 
 ZelStaticBitmap::~ZelStaticBitmap()
@@ -476,10 +478,11 @@ void ZelStaticBitmap::OnKeyDown(wxKeyEvent& event)
     }
 }
 
-void ZelStaticBitmap::GTKHandleRealized()
+void ZelStaticBitmap::OnWindowCreate(wxWindowCreateEvent& event)
 {
-    wxControl::GTKHandleRealized();
-    DropInputMethod(this);
+    if (event.GetWindow() == this)
+        DropInputMethod(this);
+    event.Skip();
 }
 
 void ZelStaticBitmap::OnSysColourChanged(wxSysColourChangedEvent& event)

@@ -60,6 +60,7 @@ public:
     virtual void OnSetFocus(wxFocusEvent& event);
     virtual void OnKeyDown(wxKeyEvent& event);
     virtual void OnCaptureLost(wxMouseCaptureLostEvent& event);
+    virtual void OnWindowCreate(wxWindowCreateEvent& event);
 
     bool Enable(bool enable = true) override;
     bool SetBackgroundColour(const wxColour& colour) override;
@@ -69,8 +70,6 @@ public:
 
     // Sends the button-click command event, as a click with the mouse does.
     void Click();
-
-    void GTKHandleRealized() override;
 
 protected:
     wxSize DoGetBestSize() const override;

@@ -5,7 +5,7 @@
 #include "instrument/MeasuringTable.h"
 #include "platform/MessageBox.h"
 #include "platform/ProcessStart.h"
-#include "platform/X11Windows.h"
+#include "platform/WindowActivation.h"
 
 #include <wx/filename.h>
 #include <wx/process.h>

@@ -1,5 +1,5 @@
-#include "app/UserLanguage.h"
 #include "frame/Veltro3MainAppStandardView.h"
+#include "platform/UserLanguage.h"
 
 namespace {
 

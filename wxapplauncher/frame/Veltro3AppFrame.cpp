@@ -7,7 +7,7 @@
 #include "frame/ModuleCatalog.h"
 #include "frame/Veltro3MainAppStandardView.h"
 #include "help/Documentation.h"
-#include "platform/X11Windows.h"
+#include "platform/DisplaySession.h"
 #include "resources/IconBundle.h"
 #include "resources/ImageSets.h"
 #include "settings/UpdateCheck.h"
@@ -202,12 +202,12 @@ void Veltro3AppFrame::OnClose(wxCloseEvent&)
 
 void Veltro3AppFrame::OnSize(wxSizeEvent& event)
 {
-    // GTK on Wayland draws the decorations itself and counts them in the fixed size,
-    // which the toolkit set before it knew them: what the view lost then goes back
+    // Decorations the toolkit draws itself count in the fixed size, which the
+    // toolkit set before it knew them: what the view lost then goes back
     // into the size, once, so that a window manager that imposes sizes cannot make
     // it grow without end.
     const wxSize missing = m_fixedClientSize - GetClientSize();
-    if (!m_decorationsCounted && IsShown() && missing != wxSize() && !IsOnX11Display()) {
+    if (!m_decorationsCounted && IsShown() && missing != wxSize() && !AreDecorationsOutsideSize()) {
         m_decorationsCounted = true;
         SetMinSize(GetMinSize() + missing);
         SetMaxSize(GetMaxSize() + missing);

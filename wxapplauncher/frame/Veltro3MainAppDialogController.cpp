@@ -38,6 +38,7 @@ wxBEGIN_EVENT_TABLE(Veltro3MainAppDialogController, wxPanel)
     EVT_SYS_COLOUR_CHANGED(Veltro3MainAppDialogController::OnSysColourChanged)
     EVT_PAINT(Veltro3MainAppDialogController::OnPaint)
     EVT_ERASE_BACKGROUND(Veltro3MainAppDialogController::OnEraseBackground)
+    EVT_WINDOW_CREATE(Veltro3MainAppDialogController::OnWindowCreate)
 wxEND_EVENT_TABLE()
 // clang-format on
 
@@ -75,10 +76,11 @@ void Veltro3MainAppDialogController::Refresh(bool eraseBackground, const wxRect*
     wxPanel::Refresh(eraseBackground, rect);
 }
 
-void Veltro3MainAppDialogController::GTKHandleRealized()
+void Veltro3MainAppDialogController::OnWindowCreate(wxWindowCreateEvent& event)
 {
-    wxPanel::GTKHandleRealized();
-    DropInputMethod(this);
+    if (event.GetWindow() == this)
+        DropInputMethod(this);
+    event.Skip();
 }
 
 wxSize Veltro3MainAppDialogController::DoGetBestSize() const

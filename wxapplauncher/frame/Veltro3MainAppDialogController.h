@@ -18,15 +18,14 @@ public:
     virtual void OnSysColourChanged(wxSysColourChangedEvent& event);
     virtual void OnPaint(wxPaintEvent& event);
     virtual void OnEraseBackground(wxEraseEvent& event);
+    // The panel takes no text: it keeps no input method (see DropInputMethod).
+    virtual void OnWindowCreate(wxWindowCreateEvent& event);
     virtual void UpdateModuleButtons();
     // Draws over the background into the back buffer.
     virtual void DrawContent(wxDC& dc);
 
     // Every refresh re-renders the back buffer.
     void Refresh(bool eraseBackground = true, const wxRect* rect = nullptr) override;
-
-    // The panel takes no text: it keeps no input method (see DropInputMethod).
-    void GTKHandleRealized() override;
 
 protected:
     wxSize DoGetBestSize() const override;

@@ -1,8 +1,8 @@
 #include "help/CHelpToolDlg.h"
 
-#include "app/UserLanguage.h"
 #include "help/HelpLanguage.h"
 #include "help/HelpToolTextCtrl.h"
+#include "platform/UserLanguage.h"
 
 #include <wx/button.h>
 #include <wx/filefn.h>
@@ -57,9 +57,9 @@ wxBoxSizer* Row(int leftSpace, std::initializer_list<wxWindow*> windows)
 // clang-format off
 wxBEGIN_EVENT_TABLE(CHelpToolDlg, ZelCommonDlg)
 wxEND_EVENT_TABLE()
-    // clang-format on
+// clang-format on
 
-    wxIMPLEMENT_DYNAMIC_CLASS(CHelpToolDlg, wxDialog);
+wxIMPLEMENT_DYNAMIC_CLASS(CHelpToolDlg, wxDialog);
 
 CHelpToolDlg::CHelpToolDlg() = default;
 

@@ -1,9 +1,9 @@
 #include "help/Documentation.h"
 
-#include "app/UserLanguage.h"
 #include "help/CAcrobatNotFoundDialog.h"
-#include "help/DesktopOpen.h"
+#include "platform/DesktopOpen.h"
 #include "platform/MessageBox.h"
+#include "platform/UserLanguage.h"
 
 #include <wx/app.h>
 #include <wx/dir.h>

@@ -4,22 +4,10 @@
 
 namespace {
 
-struct VaroOrdinal
-{
-    int ordinal;
-    const char* symbol;
-};
-
-const VaroOrdinal kOrdinals[] = {
-    {18, "VaroRegisterCallback"}, {14, "VaroCheckInstrument"}, {23, "VaroCheckTableMount"},
-    {11, "VaroSetOption"},        {12, "VaroGetOption"},       {5, "VaroMeasure"},
-};
-
 template <typename Function> bool Resolve(int ordinal, Function& function)
 {
-    const char* symbol = VaroSymbolForOrdinal(ordinal);
-    // dlsym hands out object pointers; POSIX guarantees they convert to functions.
-    function = reinterpret_cast<Function>(VaroLibrary::Get().Symbol(symbol));
+    // The library hands out object pointers; both systems let them convert to functions.
+    function = reinterpret_cast<Function>(VaroLibrary::Get().Function(ordinal));
     return function != nullptr;
 }
 
@@ -31,14 +19,6 @@ bool ResolveAll(VaroFunctions& functions)
 }
 
 } // namespace
-
-const char* VaroSymbolForOrdinal(int ordinal)
-{
-    for (const VaroOrdinal& entry : kOrdinals)
-        if (entry.ordinal == ordinal)
-            return entry.symbol;
-    return nullptr;
-}
 
 const VaroFunctions* VaroFunctions::Get()
 {

@@ -1,5 +1,5 @@
-// The six functions of the instrument library, known by ordinal. On Linux the
-// library exports them by name:
+// The six functions of the instrument library, known by ordinal (on Linux the
+// library exports them by name):
 //   18 VaroRegisterCallback  register the notification callback
 //   14 VaroCheckInstrument   0 = an instrument answers
 //   23 VaroCheckTableMount   0 = the instrument sits on the measuring table
@@ -16,9 +16,6 @@ typedef void (*VaroSetOptionFunction)(const char* name, const char* value);
 typedef const char* (*VaroGetOptionFunction)(const char* name);
 typedef int (*VaroMeasureFunction)();
 }
-
-// The symbol exported for an ordinal, or null for an ordinal the client does not use.
-const char* VaroSymbolForOrdinal(int ordinal);
 
 // The library's functions, resolved all together: when the library or any one
 // of them is missing, Get() answers null and the client acts as if no

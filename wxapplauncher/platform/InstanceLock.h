@@ -4,24 +4,26 @@
 
 #include <wx/string.h>
 
+#include <memory>
+
 // Used like the toolkit's single-instance checker: Create, then IsAnotherRunning.
-// The lock is an flock on a file in the private runtime directory; the kernel
-// drops it with its holder. The file is never deleted, so two copies always
-// contend for the same file.
+// The system drops the lock with its holder.
 class InstanceLock
 {
 public:
-    InstanceLock() = default;
+    InstanceLock();
     ~InstanceLock();
     InstanceLock(const InstanceLock&) = delete;
     InstanceLock& operator=(const InstanceLock&) = delete;
 
-    // Takes the lock `name` in `dir` (the private runtime directory when empty).
-    // False when there is no usable directory or file; then no copy is seen.
+    // Takes the lock `name` in `dir` (the system's place for the user's locks
+    // when empty). False when the lock cannot be made; then no copy is seen.
     bool Create(const wxString& name, const wxString& dir = wxString());
     bool IsAnotherRunning() const { return m_anotherRunning; }
 
 private:
-    int m_fd = -1;
+    // What the system keeps for a lock that is held.
+    struct Held;
+    std::unique_ptr<Held> m_held;
     bool m_anotherRunning = false;
 };

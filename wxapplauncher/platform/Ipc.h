@@ -1,12 +1,12 @@
-// The launcher's IPC: the toolkit's socket IPC protocol over Unix sockets that
-// live in the user's private directory, one socket per service name, with every
-// wait bounded and every length checked before anything is allocated.
+// The launcher's IPC: conversations with a service by name on a topic, carrying
+// pokes, with every wait bounded and every length checked before anything is
+// allocated. The transport is the system's: the toolkit's IPC protocol over
+// Unix sockets in the user's private directory, or DDE.
 #pragma once
 
 #include <wx/ipcbase.h>
 #include <wx/string.h>
 
-#include <chrono>
 #include <memory>
 
 // How long a connection attempt may take in all, waiting for a server included.
@@ -21,17 +21,21 @@ constexpr size_t kIpcMaxPokeSize = 64 * 1024;
 // The longest topic or item name accepted.
 constexpr size_t kIpcMaxNameSize = 1024;
 
-// The socket path of `service` in the private directory. Empty when the name is
-// empty, ".", "..", or holds a "/" or a NUL, when the private directory is not
-// safe to use, or when the path does not fit a Unix socket address.
-wxString GetServiceSocketPath(const wxString& service);
+// False when `service` can never be reached: a name the transport refuses
+// (empty, and on Linux ".", "..", one holding a "/" or a NUL, or too long for a
+// socket address) or no safe place to serve it. A connection to it fails at
+// once, so there is nothing to wait for.
+bool IsServiceNameUsable(const wxString& service);
+
+class IpcChannel;
+class IpcListener;
 
 // One conversation. On the client's side it sends pokes until its deadline; on
 // the server's side it receives them through OnPoke. Only its holder deletes it.
 class IpcConnection : public wxConnectionBase
 {
 public:
-    IpcConnection() = default;
+    IpcConnection();
     ~IpcConnection() override;
 
     bool Disconnect() override;
@@ -47,24 +51,23 @@ protected:
 
 private:
     friend class IpcClient;
-    int m_fd = -1;
-    std::chrono::steady_clock::time_point m_deadline;
+    friend class IpcListener;
+    // The system's end of a conversation the client opened.
+    std::unique_ptr<IpcChannel> m_channel;
 };
-
-class IpcListener;
 
 // A server that registers a service by name and serves it from the GUI event
 // loop: a peer that stalls, sends too much or breaks the protocol is dropped,
-// never waited for. At its end it removes its socket only while the file is
-// still the one it made: a newer server at the same path keeps its socket.
+// never waited for. At its end it gives up its name only while the name is
+// still its own: a newer server of the same name keeps it.
 class IpcServer : public wxServerBase
 {
 public:
     IpcServer();
     ~IpcServer() override;
 
-    // False, with nothing registered, when the socket path is refused or the
-    // socket cannot be bound. A stale socket at the path is replaced.
+    // False, with nothing registered, when the name is refused or cannot be
+    // registered. What a server that died left of the name is replaced.
     bool Create(const wxString& service) override;
 
     // The connection for a conversation on `topic`; null refuses it.

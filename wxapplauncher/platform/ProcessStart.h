@@ -1,7 +1,9 @@
-// Starting another program from an argument vector.
+// Starting other programs.
 #pragma once
 
 #include <wx/arrstr.h>
+
+#include <wx/string.h>
 
 class wxProcess;
 
@@ -9,3 +11,8 @@ class wxProcess;
 // given: no shell, no re-splitting of a command line. Returns the process id,
 // or 0 when the program could not be started.
 long StartProcess(const wxArrayString& argv, wxProcess* process);
+
+// Starts the program at `path` without arguments and without watching it, the
+// way the desktop starts a program the user opens. False when it could not be
+// started.
+bool StartProgram(const wxString& path);

@@ -4,7 +4,6 @@
 
 #include <cstring>
 #include <fstream>
-#include <limits>
 
 namespace {
 
@@ -109,95 +108,12 @@ bool MemoryByteSource::Read(std::uint64_t offset, void* out, std::size_t count) 
     return true;
 }
 
-bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
-                    std::vector<unsigned char>& contents)
-{
-    unsigned char ident[64];
-    static const unsigned char magic[4] = {0x7F, 'E', 'L', 'F'};
-    if (!source.Read(0, ident, 16) || std::memcmp(ident, magic, 4) != 0)
-        return false;
-    const bool is64 = ident[4] == 2;
-    if ((ident[4] != 1 && !is64) || ident[5] != 1)
-        return false;
-    const std::size_t headerSize = is64 ? 64 : 52;
-    if (!source.Read(0, ident, headerSize))
-        return false;
-    const std::uint64_t shoff = is64 ? Le64(ident + 0x28) : Le32(ident + 0x20);
-    const unsigned entrySize = Le16(ident + (is64 ? 0x3A : 0x2E));
-    const unsigned count = Le16(ident + (is64 ? 0x3C : 0x30));
-    const unsigned namesIndex = Le16(ident + (is64 ? 0x3E : 0x32));
-    const unsigned minEntry = is64 ? 64 : 40;
-    if (entrySize < minEntry || count == 0 || namesIndex >= count)
-        return false;
-    if (shoff > source.Size() || std::uint64_t(entrySize) * count > source.Size() - shoff)
-        return false;
-
-    struct Section
-    {
-        std::uint32_t name, type;
-        std::uint64_t offset, size;
-    };
-    auto readSection = [&](unsigned index, Section& s) {
-        unsigned char raw[64];
-        if (!source.Read(shoff + std::uint64_t(index) * entrySize, raw, minEntry))
-            return false;
-        s.name = Le32(raw);
-        s.type = Le32(raw + 4);
-        s.offset = is64 ? Le64(raw + 0x18) : Le32(raw + 0x10);
-        s.size = is64 ? Le64(raw + 0x20) : Le32(raw + 0x14);
-        return true;
-    };
-
-    Section names;
-    if (!readSection(namesIndex, names) || names.offset > source.Size() ||
-        names.size > source.Size() - names.offset)
-        return false;
-    const std::uint32_t noBits = 8;
-    for (unsigned i = 0; i < count; ++i) {
-        Section s;
-        if (!readSection(i, s) || s.name >= names.size)
-            continue;
-        // Compare the name in place, one byte more to see its terminator.
-        const std::uint64_t want = sectionName.size() + 1;
-        if (names.size - s.name < want)
-            continue;
-        std::string candidate(sectionName.size() + 1, '\0');
-        if (!source.Read(names.offset + s.name, &candidate[0], candidate.size()) ||
-            candidate.compare(0, sectionName.size(), sectionName) != 0 || candidate.back() != '\0')
-            continue;
-        if (s.type == noBits || s.offset > source.Size() || s.size > source.Size() - s.offset ||
-            s.size > std::numeric_limits<std::size_t>::max())
-            return false;
-        contents.resize(std::size_t(s.size));
-        return source.Read(s.offset, contents.data(), contents.size());
-    }
-    return false;
-}
-
-bool ReadElfSectionOfFile(const std::string& path, const std::string& sectionName,
-                          std::vector<unsigned char>& contents)
-{
-    return ReadElfSection(FileByteSource(path), sectionName, contents);
-}
-
 ResourceImage::ResourceImage(std::vector<unsigned char> bytes) : m_bytes(std::move(bytes))
 {
     Parse();
 }
 
-ResourceImage ResourceImage::FromElfFile(const std::string& path)
-{
-    std::vector<unsigned char> bytes;
-    if (!ReadElfSectionOfFile(path, ".rsrc", bytes))
-        return ResourceImage();
-    return ResourceImage(std::move(bytes));
-}
-
-const ResourceImage& ResourceImage::OfExecutable()
-{
-    static const ResourceImage image = FromElfFile("/proc/self/exe");
-    return image;
-}
+ResourceImage::ResourceImage(std::vector<ResourceEntry> entries) : m_entries(std::move(entries)) {}
 
 // Each entry: data size, header size, type, name (each 0xFFFF + number or a
 // NUL-terminated UTF-16 string), padding to 4, then data version, memory flags,

@@ -1,6 +1,7 @@
-// The Windows resources (a .res image from windres) that the build stores in the
-// executable's ELF section ".rsrc": enumerate, find and read them. Every read is
-// bounds-checked; a malformed image yields the entries before the fault, never a crash.
+// The executable's Windows resources: enumerate, find and read them. On Linux
+// they are a .res image from windres that the build stores in the ELF section
+// ".rsrc"; every read of such an image is bounds-checked, and a malformed image
+// yields the entries before the fault, never a crash.
 #pragma once
 
 #include <cstddef>
@@ -69,29 +70,25 @@ private:
     std::uint64_t m_size = 0;
 };
 
-// The contents of the named section of an ELF file (32 or 64 bit, little-endian);
-// false when the file is no such ELF file, lacks the section or is malformed.
-bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
-                    std::vector<unsigned char>& contents);
-bool ReadElfSectionOfFile(const std::string& path, const std::string& sectionName,
-                          std::vector<unsigned char>& contents);
-
-// A parsed .res image. It owns its bytes, so entries stay valid as long as the image:
-// finding a resource also loads and locks it, and nothing has to be freed.
+// A set of resources: a parsed .res image, or resources the system keeps loaded.
+// An image owns its bytes, so entries stay valid as long as the image: finding a
+// resource also loads and locks it, and nothing has to be freed.
 class ResourceImage
 {
 public:
     ResourceImage() = default;
     explicit ResourceImage(std::vector<unsigned char> bytes);
+    // Entries whose data the system keeps for the whole run, such as a loaded
+    // module's own resources.
+    explicit ResourceImage(std::vector<ResourceEntry> entries);
     ResourceImage(const ResourceImage&) = delete;
     ResourceImage& operator=(const ResourceImage&) = delete;
     // Moving keeps the byte buffer, so entries stay valid.
     ResourceImage(ResourceImage&&) = default;
     ResourceImage& operator=(ResourceImage&&) = default;
 
-    // The resources of an ELF file's ".rsrc" section; empty when there are none.
-    static ResourceImage FromElfFile(const std::string& path);
-    // The running executable's resources, read once per process.
+    // The running executable's resources, read once per process; empty when
+    // there are none.
     static const ResourceImage& OfExecutable();
 
     const std::vector<ResourceEntry>& Entries() const { return m_entries; }

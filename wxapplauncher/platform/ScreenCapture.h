@@ -1,4 +1,4 @@
-// Reading what the screen shows. Only an X11 desktop lets a program do that; elsewhere
+// Reading what the screen shows. Where the desktop does not let a program do that
 // (Wayland) and on failure the result is an invalid image.
 #pragma once
 

@@ -1,5 +1,5 @@
-// Loads the instrument maker's shared library once per process: from the
-// launcher's own directory, else by name from the system's library path.
+// Loads the instrument maker's library once per process: from the launcher's
+// own directory, else by name from the system's library path.
 #pragma once
 
 class VaroLibrary
@@ -11,11 +11,16 @@ public:
 
     bool IsLoaded() const { return m_handle != nullptr; }
 
-    // The address of an exported symbol, or null when it or the library is missing.
+    // The function the library exports under `ordinal`, or null when it or the
+    // library is missing. Where libraries have no ordinals, the library exports
+    // the client's functions by name and the ordinals map to those names.
+    void* Function(int ordinal) const;
+
+    // The address of an exported name, or null when it or the library is missing.
     void* Symbol(const char* name) const;
 
 private:
     VaroLibrary();
 
-    void* m_handle;
+    void* m_handle; // the system's handle of the loaded library
 };

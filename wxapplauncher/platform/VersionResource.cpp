@@ -1,34 +1,21 @@
 #include "platform/VersionResource.h"
 
 #include "platform/LittleEndian.h"
-#include "platform/PeResource.h"
 #include "platform/ResourceImage.h"
 
 namespace {
 
-// VS_VERSION_INFO is resource 1 of type 16; a version block cannot be longer than
-// its 16-bit length field says.
-const std::uint16_t versionName = 1;
-const std::size_t maxVersionBlock = 0xFFFF;
 const std::size_t fixedInfoSize = 52;
 const std::uint32_t fixedInfoSignature = 0xFEEF04BDu;
 
 bool CopyVersionBlock(const ResourceImage& image, std::vector<unsigned char>& block)
 {
-    const ResourceEntry* entry = image.Find(ResourceTypeVersion, versionName);
+    const ResourceEntry* entry = image.Find(ResourceTypeVersion, kVersionResourceName);
     if (!entry)
         return false;
-    const std::size_t size = entry->size < maxVersionBlock ? entry->size : maxVersionBlock;
+    const std::size_t size = entry->size < kMaxVersionBlock ? entry->size : kMaxVersionBlock;
     block.assign(entry->data, entry->data + size);
     return true;
-}
-
-bool ReadFromElf(const ByteSource& source, std::vector<unsigned char>& block)
-{
-    std::vector<unsigned char> section;
-    if (!ReadElfSection(source, ".rsrc", section))
-        return false;
-    return CopyVersionBlock(ResourceImage(std::move(section)), block);
 }
 
 } // namespace
@@ -54,25 +41,6 @@ bool FindFixedFileInfo(const std::vector<unsigned char>& block, std::size_t& fix
         return false;
     fixedInfoOffset = valueAt;
     return true;
-}
-
-VersionResourceResult ReadVersionResource(const std::string& path,
-                                          std::vector<unsigned char>& block,
-                                          std::size_t& fixedInfoOffset)
-{
-    return ReadVersionResource(FileByteSource(path), block, fixedInfoOffset);
-}
-
-VersionResourceResult ReadVersionResource(const ByteSource& source,
-                                          std::vector<unsigned char>& block,
-                                          std::size_t& fixedInfoOffset)
-{
-    block.clear();
-    if (!ReadPeResource(source, ResourceTypeVersion, versionName, maxVersionBlock, block) &&
-        !ReadFromElf(source, block))
-        return VersionResourceResult::Missing;
-    return FindFixedFileInfo(block, fixedInfoOffset) ? VersionResourceResult::Found
-                                                     : VersionResourceResult::Malformed;
 }
 
 VersionResourceResult ReadVersionResource(const ResourceImage& image,

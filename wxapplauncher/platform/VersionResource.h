@@ -1,11 +1,17 @@
 // The version resource (VS_VERSIONINFO) of an executable, read the way the Windows
-// version functions read it: from a PE file's resources or from the ".rsrc" section
-// of an ELF file. Nothing is trusted: a malformed file is simply unreadable.
+// version functions read it. Nothing is trusted: a malformed file is simply
+// unreadable.
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <string>
 #include <vector>
+
+// VS_VERSION_INFO is resource 1 of the version type; a version block cannot be
+// longer than its 16-bit length field says.
+constexpr std::uint16_t kVersionResourceName = 1;
+constexpr std::size_t kMaxVersionBlock = 0xFFFF;
 
 enum class VersionResourceResult
 {
@@ -17,11 +23,6 @@ enum class VersionResourceResult
 // Reads the version resource of the file into block and checks its root block; on
 // Found, fixedInfoOffset is where the VS_FIXEDFILEINFO starts (its 52 bytes lie in block).
 VersionResourceResult ReadVersionResource(const std::string& path,
-                                          std::vector<unsigned char>& block,
-                                          std::size_t& fixedInfoOffset);
-
-class ByteSource;
-VersionResourceResult ReadVersionResource(const ByteSource& source,
                                           std::vector<unsigned char>& block,
                                           std::size_t& fixedInfoOffset);
 

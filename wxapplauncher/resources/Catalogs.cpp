@@ -1,7 +1,7 @@
 #include "resources/Catalogs.h"
 
-#include "app/UserLanguage.h"
 #include "platform/ResourceImage.h"
+#include "platform/UserLanguage.h"
 #include "resources/CatalogFormat.h"
 #include "resources/MemoryTranslationsLoader.h"
 

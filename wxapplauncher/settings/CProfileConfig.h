@@ -1,10 +1,10 @@
-// The settings the launcher shares with the suite's updater: a user file that
-// is read first and written, and a system-wide file read second.
+// The settings the launcher shares with the suite's updater: the user's store
+// is read first and written, the system-wide store read second.
 #pragma once
 
-#include <wx/string.h>
+#include "platform/SettingsStore.h"
 
-class wxFileConfig;
+#include <wx/string.h>
 
 class CProfileConfig
 {
@@ -18,22 +18,13 @@ public:
     wxString ReadString(const wxString& key, const wxString& defaultValue) const;
     // The stored integer, or `defaultValue` when it is missing or not an integer.
     long ReadLong(const wxString& key, long defaultValue) const;
-    // Stores the value in the user's file at once (through a link, in the file
-    // it leads to). Does nothing unless IsWritable().
+    // Stores the value in the user's store at once. Does nothing unless
+    // IsWritable().
     void WriteLong(const wxString& key, long value);
-    // True when the user's file is missing, or is UTF-8 text that was read whole
-    // and may be replaced without losing a byte. A file that is read-only, not
-    // UTF-8 or unreadable is read as far as it can be and never written.
-    bool IsWritable() const { return m_writable; }
-
-    // "<config home>/Zelgrave/<appName>.conf": $XDG_CONFIG_HOME when it is an
-    // absolute path, else ~/.config.
-    static wxString UserFile(const wxString& appName);
-    // "<config dir>/Zelgrave/<appName>.conf": the first absolute directory of
-    // $XDG_CONFIG_DIRS, else /etc/xdg.
-    static wxString SystemFile(const wxString& appName);
+    // True when the user's store can take values without losing anything it
+    // holds (see SettingsStore).
+    bool IsWritable() const { return m_store.IsWritable(); }
 
 private:
-    wxFileConfig* m_config;
-    bool m_writable;
+    SettingsStore m_store;
 };

@@ -1,17 +1,12 @@
 #include "settings/UpdateCheck.h"
 
+#include "platform/FileRemoval.h"
 #include "platform/ProcessStart.h"
 #include "settings/CProfileConfig.h"
 
 #include <wx/datetime.h>
 #include <wx/dir.h>
 #include <wx/filename.h>
-#include <wx/process.h>
-
-#include <csignal>
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
 
 namespace {
 
@@ -35,13 +30,10 @@ void StartUpdater()
 {
     // By its full path in the launcher's folder (the working directory): a
     // bare name would be looked up on PATH instead.
-    const wxArrayString argv(1, wxFileName(wxGetCwd(), kUpdaterName).GetFullPath());
+    const wxString path = wxFileName(wxGetCwd(), kUpdaterName).GetFullPath();
     // A missing updater is not reported; nothing is started in vain.
-    if (!wxFileName::FileExists(argv[0]))
-        return;
-    wxProcess* process = new wxProcess(nullptr, wxID_ANY);
-    if (StartProcess(argv, process) == 0)
-        delete process;
+    if (wxFileName::FileExists(path))
+        StartProgram(path);
 }
 
 // True once the local date has reached the day of `nextLaunch`; a time after
@@ -65,16 +57,6 @@ bool UpdateIsDue(const wxString& nextLaunch)
     return wxDateTime::Now() >= day;
 }
 
-// The kernel grants a write lease only while no other open file refers to the
-// file, whoever holds it; unlike /proc, this also sees processes of other users
-// and those that may not be inspected, at one call per file. A lease broken
-// meanwhile signals with SIGURG, ignored by default, not SIGIO, which would end
-// the launcher. Where there are no leases the file counts as in use.
-bool TakeLeaseIfUnused(int fd)
-{
-    return fcntl(fd, F_SETSIG, SIGURG) == 0 && fcntl(fd, F_SETLEASE, F_WRLCK) == 0;
-}
-
 } // namespace
 
 void RemoveUpdaterTempFiles()
@@ -83,21 +65,11 @@ void RemoveUpdaterTempFiles()
     wxArrayString files;
     if (!wxDir::Exists(dir) || wxDir::GetAllFiles(dir, &files, kTempPrefix + "*", wxDIR_FILES) == 0)
         return;
-    for (const wxString& file : files) {
-        // A shared temporary directory may hold other users' files and links
-        // planted under the updater's names. A file that a running updater
-        // holds open stays: on Windows it could not be deleted either.
-        const int fd = open(file.fn_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC);
-        if (fd < 0)
-            continue;
-        struct stat info;
-        if (fstat(fd, &info) == 0 && S_ISREG(info.st_mode) && info.st_uid == getuid() &&
-            TakeLeaseIfUnused(fd)) {
-            unlink(file.fn_str());
-            fcntl(fd, F_SETLEASE, F_UNLCK);
-        }
-        close(fd);
-    }
+    // A shared temporary directory may hold other users' files and links
+    // planted under the updater's names. A file that a running updater holds
+    // open stays.
+    for (const wxString& file : files)
+        RemoveFileIfUnused(file);
 }
 
 void CheckForUpdateAtLaunch()

@@ -1,4 +1,4 @@
-#include "app/UserLanguage.h"
+#include "platform/UserLanguage.h"
 
 #include <wx/utils.h>
 

@@ -1,12 +1,13 @@
 #include "platform/Ipc.h"
 
-#include "platform/IpcPeer.h"
+#include "platform/unix/IpcPeer.h"
 
 #include <wx/evtloop.h>
 #include <wx/evtloopsrc.h>
 #include <wx/timer.h>
 
 #include <cerrno>
+#include <chrono>
 #include <cstring>
 #include <sys/socket.h>
 #include <sys/stat.h>

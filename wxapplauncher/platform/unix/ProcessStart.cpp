@@ -1,5 +1,6 @@
 #include "platform/ProcessStart.h"
 
+#include <wx/process.h>
 #include <wx/utils.h>
 
 #include <vector>
@@ -14,4 +15,13 @@ long StartProcess(const wxArrayString& argv, wxProcess* process)
         pointers.push_back(element.wc_str());
     pointers.push_back(nullptr);
     return wxExecute(pointers.data(), wxEXEC_ASYNC, process);
+}
+
+bool StartProgram(const wxString& path)
+{
+    wxProcess* process = new wxProcess(nullptr, wxID_ANY);
+    if (StartProcess(wxArrayString(1, path), process) != 0)
+        return true;
+    delete process;
+    return false;
 }

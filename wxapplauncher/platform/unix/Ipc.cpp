@@ -1,9 +1,10 @@
 #include "platform/Ipc.h"
 
-#include "platform/IpcWire.h"
-#include "platform/PrivateRuntimeDir.h"
+#include "platform/unix/IpcWire.h"
+#include "platform/unix/PrivateRuntimeDir.h"
 
 #include <cerrno>
+#include <chrono>
 #include <cstring>
 #include <limits>
 #include <poll.h>
@@ -73,6 +74,36 @@ int OpenSocket(const wxString& path, Clock::time_point deadline)
 
 } // namespace
 
+// A client's socket and the deadline of its whole conversation.
+class IpcChannel
+{
+public:
+    IpcChannel(int fd, Clock::time_point deadline) : m_fd(fd), m_deadline(deadline) {}
+    ~IpcChannel() { close(m_fd); }
+    IpcChannel(const IpcChannel&) = delete;
+    IpcChannel& operator=(const IpcChannel&) = delete;
+
+    bool Send(const std::string& bytes) const { return SendAll(m_fd, bytes, m_deadline); }
+
+    // The server's answer to the topic: true when it opened the conversation.
+    bool Opened() const
+    {
+        unsigned char answer = kIpcFail;
+        return WaitUntil(m_fd, POLLIN, m_deadline) && recv(m_fd, &answer, 1, 0) == 1 &&
+               answer == kIpcConnect;
+    }
+
+    void SayGoodbye() const
+    {
+        const char bye = kIpcDisconnect;
+        send(m_fd, &bye, 1, MSG_NOSIGNAL | MSG_DONTWAIT);
+    }
+
+private:
+    const int m_fd;
+    const Clock::time_point m_deadline;
+};
+
 wxString GetServiceSocketPath(const wxString& service)
 {
     if (service.empty() || service == "." || service == ".." || service.Find('/') != wxNOT_FOUND ||
@@ -87,6 +118,13 @@ wxString GetServiceSocketPath(const wxString& service)
     return path;
 }
 
+bool IsServiceNameUsable(const wxString& service)
+{
+    return !GetServiceSocketPath(service).empty();
+}
+
+IpcConnection::IpcConnection() = default;
+
 IpcConnection::~IpcConnection()
 {
     Disconnect();
@@ -94,11 +132,9 @@ IpcConnection::~IpcConnection()
 
 bool IpcConnection::Disconnect()
 {
-    if (m_fd >= 0) {
-        const char bye = kIpcDisconnect;
-        send(m_fd, &bye, 1, MSG_NOSIGNAL | MSG_DONTWAIT);
-        close(m_fd);
-        m_fd = -1;
+    if (m_channel) {
+        m_channel->SayGoodbye();
+        m_channel.reset();
     }
     SetConnected(false);
     return true;
@@ -106,13 +142,13 @@ bool IpcConnection::Disconnect()
 
 bool IpcConnection::DoPoke(const wxString& item, const void* data, size_t size, wxIPCFormat format)
 {
-    if (m_fd < 0 || size > std::numeric_limits<std::uint32_t>::max())
+    if (!m_channel || size > std::numeric_limits<std::uint32_t>::max())
         return false;
     std::string message(1, static_cast<char>(kIpcPoke));
     message += IpcName(item);
     message += static_cast<char>(format);
     AppendIpcBlock(message, data, static_cast<std::uint32_t>(size));
-    return SendAll(m_fd, message, m_deadline);
+    return m_channel->Send(message);
 }
 
 wxConnectionBase* IpcClient::Connect(const wxString& service, const wxString& topic, int timeoutMs)
@@ -120,33 +156,17 @@ wxConnectionBase* IpcClient::Connect(const wxString& service, const wxString& to
     const wxString path = GetServiceSocketPath(service);
     if (path.empty())
         return nullptr;
-    auto connection = std::make_unique<IpcConnection>();
-    connection->m_deadline = Clock::now() + std::chrono::milliseconds(timeoutMs);
-    connection->m_fd = OpenSocket(path, connection->m_deadline);
-    const int fd = connection->m_fd;
-    unsigned char answer = kIpcFail;
-    if (fd < 0 ||
-        !SendAll(fd, std::string(1, static_cast<char>(kIpcConnect)) + IpcName(topic),
-                 connection->m_deadline) ||
-        !WaitUntil(fd, POLLIN, connection->m_deadline) || recv(fd, &answer, 1, 0) != 1 ||
-        answer != kIpcConnect) {
-        // No conversation was opened: nothing to end.
-        if (fd >= 0)
-            close(fd);
-        connection->m_fd = -1;
+    const auto deadline = Clock::now() + std::chrono::milliseconds(timeoutMs);
+    const int fd = OpenSocket(path, deadline);
+    if (fd < 0)
         return nullptr;
-    }
+    // Until the server opened the conversation there is nothing to end: the
+    // channel closes without a goodbye.
+    auto channel = std::make_unique<IpcChannel>(fd, deadline);
+    if (!channel->Send(std::string(1, static_cast<char>(kIpcConnect)) + IpcName(topic)) ||
+        !channel->Opened())
+        return nullptr;
+    auto connection = std::make_unique<IpcConnection>();
+    connection->m_channel = std::move(channel);
     return connection.release();
-}
-
-bool ReadPokeText(const void* data, size_t size, wxIPCFormat format, wxString& text)
-{
-    text.clear();
-    if (!data || size > kIpcMaxPokeSize || (format != wxIPC_TEXT && format != wxIPC_UTF8TEXT))
-        return false;
-    const char* bytes = static_cast<const char*>(data);
-    const void* end = std::memchr(bytes, '\0', size);
-    const size_t length = end ? static_cast<const char*>(end) - bytes : size;
-    text = wxString::FromUTF8(bytes, length);
-    return length == 0 || !text.empty();
 }

@@ -1,4 +1,4 @@
-#include "platform/X11Windows.h"
+#include "platform/WindowActivation.h"
 
 #include <gdk/gdk.h>
 #include <gdk/gdkx.h>
@@ -129,10 +129,4 @@ bool BringWindowToFront(const char* windowClass, const char* title)
     XSetErrorHandler(previous);
     XCloseDisplay(display);
     return found;
-}
-
-bool IsOnX11Display()
-{
-    GdkDisplay* display = gdk_display_get_default();
-    return display && GDK_IS_X11_DISPLAY(display);
 }

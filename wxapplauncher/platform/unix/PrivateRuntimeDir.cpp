@@ -1,4 +1,4 @@
-#include "platform/PrivateRuntimeDir.h"
+#include "platform/unix/PrivateRuntimeDir.h"
 
 #include <wx/filename.h>
 #include <wx/utils.h>

@@ -1,15 +1,16 @@
-#include "controls/ButtonAccessible.h"
+#include "platform/ButtonAccessibility.h"
 
-#include "controls/ZelStaticBitmap.h"
+#include <wx/window.h>
 
 #include <gtk/gtk-a11y.h>
 #include <gtk/gtk.h>
 
 #include <mutex>
+#include <utility>
 
 // The toolkit draws every window into a widget of one class of its own, so the
 // accessible type set for that class answers for all of them: as before for
-// any widget that is not an image button.
+// any widget that is not a labelled image button.
 namespace {
 
 const char kButtonKey[] = "veltrona-image-button";
@@ -17,24 +18,30 @@ const char kNameKey[] = "veltrona-name";
 
 AtkObjectClass* g_parentClass = nullptr;
 
+struct ExposedButton
+{
+    wxWindow* window;
+    ButtonAccessibility answers;
+};
+
 // The image button behind the accessible; none for an unlabelled one, which
 // is a picture.
-ZelStaticBitmap* ButtonOf(gpointer accessible)
+ExposedButton* ButtonOf(gpointer accessible)
 {
     GtkWidget* widget = gtk_accessible_get_widget(GTK_ACCESSIBLE(accessible));
     auto* button =
-        widget ? static_cast<ZelStaticBitmap*>(g_object_get_data(G_OBJECT(widget), kButtonKey))
+        widget ? static_cast<ExposedButton*>(g_object_get_data(G_OBJECT(widget), kButtonKey))
                : nullptr;
-    return button && !button->GetLabel().empty() ? button : nullptr;
+    return button && button->answers.isLabelled() ? button : nullptr;
 }
 
 const gchar* GetName(AtkObject* accessible)
 {
-    ZelStaticBitmap* button = ButtonOf(accessible);
+    ExposedButton* button = ButtonOf(accessible);
     if (!button || accessible->name)
         return g_parentClass->get_name(accessible);
     // ATK hands out the string without a copy: keep it with the accessible.
-    gchar* name = g_strdup(button->GetLabelText().utf8_str());
+    gchar* name = g_strdup(button->answers.name().utf8_str());
     g_object_set_data_full(G_OBJECT(accessible), kNameKey, name, g_free);
     return name;
 }
@@ -64,12 +71,12 @@ const gchar* GetActionName(AtkAction* action, gint i)
 
 gboolean DoAction(AtkAction* action, gint i)
 {
-    ZelStaticBitmap* button = ButtonOf(action);
-    if (!button || i != 0 || !button->IsEnabled())
+    ExposedButton* button = ButtonOf(action);
+    if (!button || i != 0 || !button->window->IsEnabled())
         return FALSE;
     // The caller waits for the answer over the accessibility bus: start the
-    // module after answering. Pending calls go with the button.
-    button->CallAfter([button] { button->Click(); });
+    // module after answering. Pending calls go with the window.
+    button->window->CallAfter(button->answers.click);
     return TRUE;
 }
 
@@ -101,20 +108,26 @@ GType RegisterButtonAccessible()
     return type;
 }
 
+void DeleteButton(gpointer button)
+{
+    delete static_cast<ExposedButton*>(button);
+}
+
 } // namespace
 
-void ExposeAsButton(ZelStaticBitmap* button)
+void ExposeAsButton(wxWindow* window, ButtonAccessibility button)
 {
-    GtkWidget* widget = button->GetHandle();
+    GtkWidget* widget = window->GetHandle();
     static std::once_flag once;
     std::call_once(once, [widget] {
         gtk_widget_class_set_accessible_type(GTK_WIDGET_GET_CLASS(widget),
                                              RegisterButtonAccessible());
     });
-    g_object_set_data(G_OBJECT(widget), kButtonKey, button);
+    g_object_set_data_full(G_OBJECT(widget), kButtonKey,
+                           new ExposedButton{window, std::move(button)}, DeleteButton);
 }
 
-void ForgetButton(ZelStaticBitmap* button)
+void ForgetButton(wxWindow* window)
 {
-    g_object_set_data(G_OBJECT(button->GetHandle()), kButtonKey, nullptr);
+    g_object_set_data(G_OBJECT(window->GetHandle()), kButtonKey, nullptr);
 }

@@ -1,4 +1,4 @@
-#include "help/DesktopOpen.h"
+#include "platform/DesktopOpen.h"
 
 #include "platform/ProcessStart.h"
 

@@ -1,4 +1,4 @@
-#include "platform/IpcPeer.h"
+#include "platform/unix/IpcPeer.h"
 
 #include "platform/LittleEndian.h"
 

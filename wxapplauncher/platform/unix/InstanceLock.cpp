@@ -1,6 +1,6 @@
 #include "platform/InstanceLock.h"
 
-#include "platform/PrivateRuntimeDir.h"
+#include "platform/unix/PrivateRuntimeDir.h"
 
 #include <cerrno>
 #include <fcntl.h>
@@ -8,17 +8,26 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-InstanceLock::~InstanceLock()
+// An flock on a file in the private runtime directory; the kernel drops it with
+// its holder. The file is never deleted, so two copies always contend for the
+// same file.
+struct InstanceLock::Held
 {
-    if (m_fd >= 0)
-        close(m_fd);
-}
+    explicit Held(int fd) : fd(fd) {}
+    ~Held() { close(fd); }
+    Held(const Held&) = delete;
+    Held& operator=(const Held&) = delete;
+
+    const int fd;
+};
+
+InstanceLock::InstanceLock() = default;
+
+InstanceLock::~InstanceLock() = default;
 
 bool InstanceLock::Create(const wxString& name, const wxString& dir)
 {
-    if (m_fd >= 0)
-        close(m_fd);
-    m_fd = -1;
+    m_held.reset();
     m_anotherRunning = false;
 
     wxString folder = dir.empty() ? GetPrivateRuntimeDir() : dir;
@@ -46,6 +55,6 @@ bool InstanceLock::Create(const wxString& name, const wxString& dir)
         close(fd);
         return m_anotherRunning;
     }
-    m_fd = fd;
+    m_held = std::make_unique<Held>(fd);
     return true;
 }

@@ -5,12 +5,13 @@
 #include <wx/intl.h>
 #include <wx/string.h>
 
-// Takes the decision from the environment (LC_ALL, LC_MESSAGES, LANG) and keeps it
-// for the run. A locale that is not installed still counts: "de_XX" is German.
+// Takes the decision from what the system says (on Linux the environment: LC_ALL,
+// LC_MESSAGES, LANG) and keeps it for the run. A locale that is not installed
+// still counts: "de_XX" is German.
 void DecideUserLanguage();
 
 // The decided language's toolkit value; wxLANGUAGE_UNKNOWN when none is known.
-// Before start-up decided, both read the environment afresh.
+// Before start-up decided, both ask the system afresh.
 wxLanguage GetUserLanguage();
 
 // The canonical name of the user's language ("de_DE", "ja", "pt_BR"); empty when unknown.

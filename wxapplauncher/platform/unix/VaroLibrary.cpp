@@ -9,6 +9,18 @@ namespace {
 
 const char kLibraryName[] = "libvaro.so";
 
+// The library exports by name what the Windows library exports by ordinal.
+struct VaroOrdinal
+{
+    int ordinal;
+    const char* symbol;
+};
+
+const VaroOrdinal kOrdinals[] = {
+    {18, "VaroRegisterCallback"}, {14, "VaroCheckInstrument"}, {23, "VaroCheckTableMount"},
+    {11, "VaroSetOption"},        {12, "VaroGetOption"},       {5, "VaroMeasure"},
+};
+
 void* Open(const wxString& path)
 {
     return dlopen(path.fn_str(), RTLD_NOW | RTLD_LOCAL);
@@ -30,6 +42,14 @@ VaroLibrary::VaroLibrary() : m_handle(nullptr)
         m_handle = Open(besideLauncher.GetFullPath());
     if (m_handle == nullptr)
         m_handle = Open(kLibraryName);
+}
+
+void* VaroLibrary::Function(int ordinal) const
+{
+    for (const VaroOrdinal& entry : kOrdinals)
+        if (entry.ordinal == ordinal)
+            return Symbol(entry.symbol);
+    return nullptr;
 }
 
 void* VaroLibrary::Symbol(const char* name) const

@@ -4,7 +4,7 @@
 #pragma once
 
 #include "platform/Ipc.h"
-#include "platform/IpcWire.h"
+#include "platform/unix/IpcWire.h"
 
 #include <chrono>
 #include <memory>
