@@ -28,7 +28,7 @@ void ThrowUnlessFound(VersionResourceResult result)
 
 VersionInfo::VersionInfo(const wxString& path)
 {
-    ThrowUnlessFound(ReadVersionResource(std::string(path.fn_str()), m_buffer, m_fixedInfo));
+    ThrowUnlessFound(ReadVersionResource(path.utf8_string(), m_buffer, m_fixedInfo));
 }
 
 VersionInfo::VersionInfo(const ResourceImage& resources)

@@ -1,6 +1,7 @@
 #include "resources/IconBundle.h"
 
 #include "platform/IconResource.h"
+#include "platform/ResourceIcon.h"
 #include "platform/ResourceImage.h"
 
 #include <wx/bitmap.h>
@@ -37,9 +38,14 @@ wxImage DecodeIconResourceImage(const unsigned char* data, std::size_t size)
 
 namespace {
 
-// The icon of one image resource, or an invalid icon.
-wxIcon CreateIconFromResource(const ResourceEntry& resource)
+// The icon of one image resource at the size its group gives (0 meaning 256),
+// or an invalid icon.
+wxIcon CreateIconFromResource(const ResourceEntry& resource, const IconGroupEntry& entry)
 {
+    if (const std::optional<wxIcon> made =
+            SystemIconFromResource(resource.data, resource.size, entry.width ? entry.width : 256,
+                                   entry.height ? entry.height : 256))
+        return *made;
     const wxImage image = DecodeIconResourceImage(resource.data, resource.size);
     wxIcon icon;
     if (image.IsOk())
@@ -70,7 +76,7 @@ wxIconBundle LoadIconBundle(const ResourceImage& image, const wxString& name, in
         ResourceEntry bounded = *resource;
         if (entry.bytes < bounded.size)
             bounded.size = entry.bytes;
-        const wxIcon icon = CreateIconFromResource(bounded);
+        const wxIcon icon = CreateIconFromResource(bounded, entry);
         if (icon.IsOk())
             bundle.AddIcon(icon);
     }
