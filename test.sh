@@ -14,5 +14,5 @@ scripts/with-xvfb.sh ctest --test-dir "$build" --output-on-failure --no-tests=er
 # ---- Instrument client under ThreadSanitizer (its own small build beside the main one).
 tests/tsan/run.sh "$build-tsan"
 
-# ---- The resource reader under libFuzzer (clang, its own build in "$build/fuzz"), briefly.
+# ---- The resource reader and the IPC server's peers under libFuzzer (clang, builds in "$build/fuzz"), briefly.
 tests/fuzz/run-fuzz.sh "$build" "${FUZZ_SECONDS:-20}"

@@ -20,6 +20,8 @@ packages=(
     weston
     xwayland
     xdotool
+    xclip
+    adwaita-icon-theme
     x11-utils
     wmctrl
     imagemagick

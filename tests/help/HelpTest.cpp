@@ -3,6 +3,8 @@
 #include "help/CHelpToolDlg.h"
 #include "help/HelpToolTextCtrl.h"
 
+#include "support/ClipboardManager.h"
+#include "support/DesktopTools.h"
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
@@ -85,6 +87,32 @@ TEST(HelpToolTest, KeysCopyThePathAndEndTheDialog)
         EXPECT_EQ(copied.GetText(), field->GetValue());
         dialog->Destroy();
     }
+}
+
+// The path copied with the keys in the shown help tool outlives the launcher: at its
+// end the desktop's clipboard manager takes it over.
+TEST(HelpToolTest, CopiedPathOutlivesTheLauncher)
+{
+    ClipboardManager manager;
+    ASSERT_TRUE(manager.Running());
+    StandinDir install({});
+    ProbeRun launcher(install.Path(), {},
+                      {{"LANG", "en_US.UTF-8"},
+                       {"LC_ALL", ""},
+                       {"VELTRONA_PROBE_SHOW_DIALOGS", "1"},
+                       {"VELTRONA_PROBE_COMMAND", "1018"}});
+    unsigned long tool = 0;
+    ASSERT_TRUE(WaitFor(
+        [&] { return (tool = WindowOf(launcher.Pid(), "Quenta Contextual Help Tool")) != 0; },
+        30000))
+        << "the help tool's window";
+    // OK has the focus; the path field is just before it.
+    TypeKeys(tool, "shift+Tab ctrl+a ctrl+c Escape");
+    ASSERT_TRUE(WaitFor([&] { return launcher.Events("command").size() == 2; }))
+        << "the help tool's end";
+    CloseWindow(launcher.Window());
+    ASSERT_EQ(launcher.ExitCode(), 0);
+    EXPECT_EQ(ClipboardText(), install.Path() + "/Documentation/en/Help/Launcher.html");
 }
 
 TEST(HelpToolTest, StatusesFollowThePagesOfTheUsersLanguage)

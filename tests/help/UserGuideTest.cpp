@@ -1,16 +1,22 @@
 // The user guide and the web pages, opened through a test desktop of its own:
 // XDG folders in which a stand-in PDF reader is registered (or not), and an
 // opener on PATH that is the real xdg-open, a stand-in, or one that fails.
+#include "app/UserLanguage.h"
 #include "controls/ZelLinkText.h"
 #include "help/CAcrobatNotFoundDialog.h"
 #include "help/Documentation.h"
+#include "resources/Catalogs.h"
 #include "support/DialogRecorder.h"
 #include "support/GuiWait.h"
 #include "support/ScopedEnv.h"
+#include "support/ShownMessageBox.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
 
 #include <gtest/gtest.h>
+#include <wx/filesys.h>
+#include <wx/fs_mem.h>
+#include <wx/timer.h>
 #include <wx/uiaction.h>
 
 #include <filesystem>
@@ -146,6 +152,66 @@ TEST(UserGuideTest, ReaderLinkOpensItsAddressOrSaysWhyNot)
     pointer.MouseClick();
     ASSERT_TRUE(WaitFor([&] { return !dialogs.Dialogs().empty(); }));
     EXPECT_EQ(dialogs.Dialogs()[0].message, "Failed to open the URL");
+}
+
+// The boxes as the screen shows them: the caption on the title bar in every language
+// (wxGTK drops its own default "Message"), the icon of the style beside the text.
+TEST(UserGuideTest, BoxesShowTheirCaptionAndIcon)
+{
+    wxFileSystem::AddHandler(new wxMemoryFSHandler);
+    LoadCatalogResources();
+    wxLocale::AddCatalogLookupPathPrefix("memory:.");
+    const StandinDir install({});
+    for (const auto& [lang, caption] :
+         {std::pair{"en_US", "Message"}, std::pair{"fr_FR", "Message"},
+          std::pair{"de_DE", "Meldung"}}) {
+        SCOPED_TRACE(lang);
+        const ScopedEnv env({{"LANG", lang + std::string(".UTF-8")}, {"LC_ALL", ""}});
+        wxLocale locale;
+        DecideUserLanguage();
+        InitLocale(locale);
+        locale.AddCatalog("Veltro");
+        const ShownMessageBox box =
+            ObserveMessageBox([&] { OpenUserGuide(install.Path() + "/", "en"); });
+        ASSERT_TRUE(box.seen);
+        EXPECT_EQ(box.title, caption);
+        EXPECT_EQ(box.icon, "dialog-information");
+    }
+
+    TestDesktop desktop("/bin/false");
+    const ShownMessageBox box = ObserveMessageBox([] { OpenURL(kHowToPage); });
+    ASSERT_TRUE(box.seen);
+    EXPECT_EQ(box.title, "Error");
+    EXPECT_EQ(box.icon, "dialog-error");
+    // The theme's error sign is red.
+    ASSERT_TRUE(box.iconPixels.IsOk());
+    const unsigned char* p = box.iconPixels.GetData();
+    int red = 0;
+    for (int i = box.iconPixels.GetWidth() * box.iconPixels.GetHeight(); i > 0; --i, p += 3)
+        red += p[0] > 160 && p[1] < 90 && p[2] < 90;
+    EXPECT_GT(red, 100);
+}
+
+// Real key presses on the shown dialog: the picture never has the focus, so Return
+// ends it as OK does, Escape as a cancel.
+TEST(UserGuideTest, ReaderDialogEndsWithReturnOrEscape)
+{
+    for (const auto& [key, result] :
+         {std::pair{WXK_RETURN, int(wxID_OK)}, std::pair{WXK_ESCAPE, int(wxID_CANCEL)}}) {
+        SCOPED_TRACE(key);
+        CAcrobatNotFoundDialog dialog(nullptr);
+        wxWindow* focused = nullptr;
+        dialog.CallAfter([&] {
+            ASSERT_TRUE(WaitFor([&] { return dialog.IsActive(); })) << "the dialog's activation";
+            focused = wxWindow::FindFocus();
+            wxUIActionSimulator().Char(key);
+        });
+        wxTimer guard;
+        guard.Bind(wxEVT_TIMER, [&](wxTimerEvent&) { dialog.EndModal(-1); });
+        guard.StartOnce(10000);
+        EXPECT_EQ(dialog.ShowModal(), result);
+        EXPECT_EQ(focused, dialog.FindWindow(140));
+    }
 }
 
 } // namespace

@@ -5,6 +5,7 @@
 #include "instrument/SimControl.h"
 #include "instrument/Varo_client.h"
 #include "support/DialogRecorder.h"
+#include "support/ShownMessageBox.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
 
@@ -14,13 +15,16 @@
 #include <wx/utils.h>
 
 #include <cstdlib>
+#include <functional>
+#include <utility>
 
 namespace {
 
 // A launcher frame in an installation of the Monitor stand-in, which logs its starts.
 struct Launcher
 {
-    Launcher()
+    // `answer` answers the dialogs the launcher shows; by default OK, unseen.
+    explicit Launcher(std::function<int(wxDialog*)> answer = {}) : dialogs(std::move(answer))
     {
         setenv("VELTRONA_STANDIN_LOG", log.c_str(), 1);
         setenv("VELTRONA_STANDIN_EXIT", "1", 1);
@@ -60,6 +64,17 @@ TEST(MonitorLaunch, StartsUnlessTheInstrumentIsOnTheTable)
     EXPECT_EQ(launcher.Starts(), 2u);
     EXPECT_EQ(launcher.dialogs.Dialogs().size(), 2u);
     EXPECT_TRUE(Varo_client::s_clients.empty());
+}
+
+// The real box on the screen carries its caption as its title.
+TEST(MonitorLaunch, TableMessageShowsItsCaption)
+{
+    Launcher launcher([](wxDialog*) { return int(wxID_NONE); });
+    SIM(varosim_set_state)(VAROSIM_TABLE);
+    const ShownMessageBox box = ObserveMessageBox([&] { launcher.Launch(); });
+    ASSERT_TRUE(box.seen);
+    EXPECT_EQ(box.title, "Message");
+    EXPECT_EQ(launcher.Starts(), 0u);
 }
 
 // Run by the test below, from a copy of this binary in a directory of its own.

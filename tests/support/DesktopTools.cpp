@@ -41,6 +41,27 @@ unsigned long WindowOf(pid_t pid, const std::string& title)
                         nullptr, 10);
 }
 
+std::string WindowTitle(unsigned long window)
+{
+    std::string title;
+    if (Display* display = XOpenDisplay(nullptr)) {
+        XTextProperty name{};
+        const Atom utf8Name = XInternAtom(display, "_NET_WM_NAME", False);
+        if ((XGetTextProperty(display, window, &name, utf8Name) && name.value) ||
+            (XGetWMName(display, window, &name) && name.value)) {
+            title.assign(reinterpret_cast<char*>(name.value), name.nitems);
+            XFree(name.value);
+        }
+        XCloseDisplay(display);
+    }
+    return title;
+}
+
+std::string ClipboardText()
+{
+    return Capture("timeout 10 xclip -o -selection clipboard -t UTF8_STRING 2>/dev/null");
+}
+
 void CloseWindow(unsigned long window)
 {
     std::system(("wmctrl -i -c " + std::to_string(window)).c_str());

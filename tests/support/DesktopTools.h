@@ -12,6 +12,8 @@ class wxRect;
 unsigned long ActiveWindow();
 // The id of process `pid`'s visible window titled exactly `title`, 0 if none.
 unsigned long WindowOf(pid_t pid, const std::string& title);
+// The window's title as the X server holds it (_NET_WM_NAME, else WM_NAME).
+std::string WindowTitle(unsigned long window);
 void CloseWindow(unsigned long window);
 void MinimiseWindow(unsigned long window);
 bool IsMinimised(unsigned long window);
@@ -20,6 +22,9 @@ bool IsMinimised(unsigned long window);
 wxRect WindowRect(unsigned long window);
 // Activates the window and types `keys` (xdotool key names) through XTest.
 void TypeKeys(unsigned long window, const std::string& keys);
+
+// The clipboard's text as another program reads it; empty when nobody holds it.
+std::string ClipboardText();
 
 // What the screen shows in a rectangle of its pixels, on the test's display or another.
 wxImage ScreenPixels(const wxRect& rect, const std::string& display = "");

@@ -4,7 +4,8 @@
 // controls, one per line); a shown window's client area follows as a "placed" event (title,
 // then x, y, width and height in the screen's physical pixels). With VELTRONA_PROBE_COMMAND=<id>,
 // the menu command <id> goes to the top window once it is first shown, and its start and end
-// are recorded as "command" events (id, then milliseconds since the probe started).
+// are recorded as "command" events (id, then milliseconds since the probe started). With
+// VELTRONA_PROBE_SHOW_DIALOGS=1 the dialogs are recorded and then shown for real.
 #include "DialogRecorder.h"
 #include "StandinRecord.h"
 #include "app/Veltro3App.h"
@@ -106,8 +107,11 @@ private:
 
 int main(int argc, char** argv)
 {
-    DialogRecorder dialogs(
-        [&dialogs](wxDialog* dialog) { return RecordDialog(dialogs.Dialogs().back(), dialog); });
+    const bool showDialogs = std::getenv("VELTRONA_PROBE_SHOW_DIALOGS") != nullptr;
+    DialogRecorder dialogs([&dialogs, showDialogs](wxDialog* dialog) {
+        const int answer = RecordDialog(dialogs.Dialogs().back(), dialog);
+        return showDialogs ? int(wxID_NONE) : answer;
+    });
     ShowRecorder recorder;
     wxEvtHandler::AddFilter(&recorder);
     // Created where the launcher's own entry point creates it, after the

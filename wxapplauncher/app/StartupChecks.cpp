@@ -1,9 +1,9 @@
 #include "app/Veltro3App.h"
 
 #include "platform/DisplaySession.h"
+#include "platform/MessageBox.h"
 
 #include <wx/display.h>
-#include <wx/msgdlg.h>
 #include <wx/settings.h>
 
 #include <algorithm>
@@ -53,7 +53,7 @@ bool Veltro3App::CheckScreenResolution(int preset)
         return true;
 
     if (HasInputSeat())
-        wxMessageBox(
+        ShowMessageBox(
             wxString::Format(
                 _("Please set your monitor to a supported resolution.\nMinimum required: %d x %d"),
                 width, height),

@@ -13,6 +13,7 @@
 #include "resources/Catalogs.h"
 #include "settings/UpdateCheck.h"
 
+#include <wx/clipbrd.h>
 #include <wx/filename.h>
 #include <wx/filesys.h>
 #include <wx/fs_mem.h>
@@ -138,6 +139,10 @@ int Veltro3App::OnRun()
 
 int Veltro3App::OnExit()
 {
+    // What the user copied (a path from the help tool) goes to the desktop's clipboard
+    // manager and outlives the launcher. Without an input seat GTK's clipboard crashes.
+    if (wxTheClipboard && HasInputSeat())
+        wxTheClipboard->Flush();
     delete m_splashTimer;
     m_splashTimer = nullptr;
     // The services go before the lock: a copy that takes the lock next finds

@@ -456,6 +456,13 @@ void ZelStaticBitmap::OnSetFocus(wxFocusEvent& event)
     event.Skip();
 }
 
+void ZelStaticBitmap::SetFocusable(bool focusable)
+{
+    m_focusable = focusable;
+    // GTK took the first answer when the window was made.
+    SetCanFocus(focusable);
+}
+
 void ZelStaticBitmap::OnKeyDown(wxKeyEvent& event)
 {
     switch (event.GetKeyCode()) {

@@ -46,6 +46,10 @@ public:
     virtual bool IsToggled() const;
     virtual bool Disable();
     virtual bool SetCentred(bool centred);
+    // A picture that is no button takes the keyboard focus neither from the
+    // keyboard nor when a dialog is shown.
+    void SetFocusable(bool focusable);
+    bool AcceptsFocus() const override { return m_focusable; }
 
     virtual void OnSysColourChanged(wxSysColourChangedEvent& event);
     virtual void OnEraseBackground(wxEraseEvent& event);
@@ -90,6 +94,7 @@ private:
     bool m_toggled = false;
     bool m_framed = false;
     bool m_centred = true;
+    bool m_focusable = true;
     int m_state = STATE_NORMAL;
 
     wxDECLARE_EVENT_TABLE();

@@ -3,11 +3,11 @@
 
 #include "frame/Ids.h"
 #include "instrument/MeasuringTable.h"
+#include "platform/MessageBox.h"
 #include "platform/ProcessStart.h"
 #include "platform/WindowActivation.h"
 
 #include <wx/filename.h>
-#include <wx/msgdlg.h>
 #include <wx/process.h>
 
 namespace {
@@ -24,9 +24,10 @@ void Veltro3MainAppStandardView::LaunchModule(int moduleId, wxString argument)
     // The Monitor module cannot profile while the instrument sits on its table;
     // this is checked before the module is looked for on disk.
     if (moduleId == ID_MODULE_MONITOR && IsInstrumentOnMeasuringTable()) {
-        wxMessageBox(_("Please remove the Zel Varo from the Orbis table.\nConnect directly to the "
-                       "Zel Varo and try again."),
-                     _("Message"), wxOK | wxCENTRE, nullptr);
+        ShowMessageBox(
+            _("Please remove the Zel Varo from the Orbis table.\nConnect directly to the "
+              "Zel Varo and try again."),
+            _("Message"), wxOK | wxCENTRE);
         return;
     }
 

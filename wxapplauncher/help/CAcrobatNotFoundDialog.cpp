@@ -37,8 +37,8 @@ CAcrobatNotFoundDialog::CAcrobatNotFoundDialog(wxWindow* parent)
     auto* icon = new ZelStaticBitmap(
         this, kIconId, wxArtProvider::GetBitmap(wxART_WARNING, wxART_CMN_DIALOG), wxDefaultPosition,
         wxDefaultSize, wxNO_BORDER, "zelStaticBitmap");
-    // A picture here, not a button: Tab passes it by.
-    icon->DisableFocusFromKeyboard();
+    // A picture here, not a button: the focus goes to OK, so Return ends the dialog.
+    icon->SetFocusable(false);
     title->Add(icon, 0, wxALIGN_CENTER_VERTICAL | wxALL, 5);
     title->Add(10, 15, 0, wxALIGN_CENTER_VERTICAL | wxALL, 5);
     // The title and the hint line are as high as the font needs: 15 and 12
@@ -59,7 +59,9 @@ CAcrobatNotFoundDialog::CAcrobatNotFoundDialog(wxWindow* parent)
                              wxDefaultSize, wxALIGN_CENTRE, "staticText");
     main->Add(m_link, 0, wxALIGN_CENTER_HORIZONTAL | wxLEFT | wxRIGHT, 20);
     main->Add(20, 5, 0, wxALIGN_CENTER_HORIZONTAL | wxALL, 5);
-    main->Add(new wxButton(this, kOkId, _("OK")), 0, wxALIGN_CENTER_HORIZONTAL | wxALL, 5);
+    auto* ok = new wxButton(this, kOkId, _("OK"));
+    ok->SetDefault();
+    main->Add(ok, 0, wxALIGN_CENTER_HORIZONTAL | wxALL, 5);
     main->Add(20, 10, 0, wxALIGN_CENTER_HORIZONTAL | wxALL, 5);
 
     SetSizer(main);

@@ -2,13 +2,13 @@
 
 #include "help/CAcrobatNotFoundDialog.h"
 #include "platform/DesktopOpen.h"
+#include "platform/MessageBox.h"
 #include "platform/UserLanguage.h"
 
 #include <wx/app.h>
 #include <wx/dir.h>
 #include <wx/filename.h>
 #include <wx/mimetype.h>
-#include <wx/msgdlg.h>
 #include <wx/stdpaths.h>
 
 #include <memory>
@@ -60,7 +60,7 @@ void OpenUserGuide(const wxString& launcherDir, const wxString& language)
     if (wxFileName::FileExists(path))
         OpenWithDesktop(path);
     else
-        wxMessageBox("\"" + path + "\" " + _("not found."), _("Message"), wxOK | wxCENTRE, nullptr);
+        ShowMessageBox("\"" + path + "\" " + _("not found."), _("Message"), wxOK | wxCENTRE);
 }
 
 void OpenUserGuide()
@@ -77,9 +77,8 @@ void OpenURL(const wxString& address)
 {
     if (address.empty())
         return;
-    OpenWithDesktop(address, [] {
-        wxMessageBox("Failed to open the URL", "Error", wxOK | wxICON_ERROR, nullptr);
-    });
+    OpenWithDesktop(address,
+                    [] { ShowMessageBox("Failed to open the URL", "Error", wxOK | wxICON_ERROR); });
 }
 
 void OpenUserForum()
