@@ -15,6 +15,9 @@ struct ProbeEvent
     std::vector<std::string> fields;
 };
 
+// A fresh name for a probe's log in the installation directory.
+std::string ProbeLogPath(const std::string& installDir);
+
 // Every line of a log of tab-separated, escaped fields, the first being the kind
 // (the probe's log, the help viewer stand-in's log).
 std::vector<ProbeEvent> ReadEventLog(const std::string& path);
@@ -49,11 +52,12 @@ public:
 
     // Until the main frame is shown.
     bool WaitForShown(int timeoutMs = 20000) const;
-    // Its frame's X window once visible, 0 if none shows.
+    // Its frame's window (X window, HWND) once visible, 0 if none shows.
     unsigned long Window() const;
     // True once the process has ended.
     bool WaitForExit(int timeoutMs = 10000);
-    // Its exit status once it has ended, 256 + the signal that ended it, -1 if it runs on.
+    // Its exit status once it has ended, 256 + the signal that ended it (Windows: the
+    // status TerminateProcess gave), -1 if it runs on.
     int ExitCode(int timeoutMs = 10000);
     void Kill(int signal);
 
@@ -62,4 +66,5 @@ private:
     bool m_reaped = false;
     int m_status = 0;
     std::string m_log;
+    void* m_process = nullptr; // Windows: the process's handle
 };

@@ -1,11 +1,12 @@
 // Runs the tests inside the launcher's own application class, its start-up left out,
-// on the environment's X display.
+// on the environment's display.
 #include "app/Veltro3App.h"
 
 #include <gtest/gtest.h>
 #include <wx/evtloop.h>
 #include <wx/init.h>
 #include <wx/log.h>
+#include <wx/utils.h>
 
 namespace {
 
@@ -32,10 +33,10 @@ int main(int argc, char** argv)
     });
 
     // The tests read other programs' accessible trees and start that bus themselves.
-    setenv("NO_AT_BRIDGE", "1", 1);
+    wxSetEnv("NO_AT_BRIDGE", "1");
     wxApp::SetInstance(new TestApp);
     const bool started = wxEntryStart(argc, argv);
-    unsetenv("NO_AT_BRIDGE");
+    wxUnsetEnv("NO_AT_BRIDGE");
     if (!started || !wxTheApp->CallOnInit()) {
         fprintf(stderr, "the toolkit could not start (is DISPLAY set?)\n");
         return 2;
