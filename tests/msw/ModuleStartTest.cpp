@@ -81,6 +81,9 @@ TEST_F(ModuleStartTest, ClicksKeysAndCommandsStartEachModuleWithItsCommandLine)
             ASSERT_TRUE(button && button->IsShownOnScreen());
             const HWND window = button->GetHWND();
             if (test.how == Click) {
+                // The button asks the system where the pointer is: it goes there first.
+                const wxPoint centre = button->GetScreenRect().GetPosition() + wxPoint(20, 20);
+                SetCursorPos(centre.x, centre.y);
                 PostMessageW(window, WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(20, 20));
                 PostMessageW(window, WM_LBUTTONUP, 0, MAKELPARAM(20, 20));
             } else {

@@ -2,6 +2,7 @@
 
 #include "frame/Ids.h"
 
+#include <wx/filename.h>
 #include <wx/intl.h>
 
 namespace {
@@ -51,7 +52,9 @@ ModuleCommand BuildModuleCommand(const ModuleInfo& module, const wxString& direc
                                  const wxString& argument)
 {
     ModuleCommand command;
-    command.argv.Add(directory + wxString::FromUTF8(module.executable));
+    // With the system's own separators: a module that splits its own path on them
+    // (Monitor's, in a sub-folder) must find its folder.
+    command.argv.Add(wxFileName(directory + wxString::FromUTF8(module.executable)).GetFullPath());
     if (module.moduleId == ID_MODULE_VERIFY) {
         command.argv.Add(argument.BeforeFirst(' '));
         command.argv.Add(argument.AfterFirst(' '));
