@@ -3,23 +3,28 @@
 #include "platform/OwnArguments.h"
 
 #include <wx/cmdargs.h>
-#include <wx/strconv.h>
+#include <wx/filefn.h>
+#include <wx/filename.h>
 
 wxString MakeAbsolutePath(const wxString& path, const wxString& base)
 {
-    if (path.empty() || path.StartsWith("/"))
+    if (path.empty() || wxIsAbsolutePath(path))
         return path;
-    if (!base.StartsWith("/"))
+    if (!wxIsAbsolutePath(base))
         return wxString();
-    wxString relative = path;
-    while (relative.StartsWith("./")) {
-        relative.erase(0, 2);
-        while (relative.StartsWith("/"))
-            relative.erase(0, 1);
+    const auto isSeparator = [](const wxString& text, size_t at) {
+        return at < text.length() && wxFileName::IsPathSeparator(text[at]);
+    };
+    size_t start = 0;
+    while (start < path.length() && path[start] == '.' && isSeparator(path, start + 1)) {
+        start += 2;
+        while (isSeparator(path, start))
+            ++start;
     }
+    const wxString relative = path.Mid(start);
     if (relative.empty() || relative == ".")
         return base;
-    return (base.EndsWith("/") ? base : base + "/") + relative;
+    return (isSeparator(base, base.length() - 1) ? base : base + wxFILE_SEP_PATH) + relative;
 }
 
 wxString CommandLineFile(const wxCmdLineArgsArray& argv, int argc, const wxString& startDir)
@@ -35,8 +40,7 @@ wxString CommandLineFile(const wxCmdLineArgsArray& argv, int argc, const wxStrin
     // user meant; the toolkit drops what it cannot read and reads some bytes
     // in the wrong character set.
     for (const wxString& candidate : {converted, wxString::FromUTF8(raw[1].c_str())}) {
-        const wxCharBuffer back = wxSafeConvertWX2MB(candidate.wc_str());
-        if (!candidate.empty() && back && raw[1] == back.data())
+        if (!candidate.empty() && RawArgument(candidate) == raw[1])
             return MakeAbsolutePath(candidate, startDir);
     }
     return wxString();

@@ -98,7 +98,8 @@ public:
     ~IpcChannel()
     {
         Finish();
-        WaitServingDde(m_shared->ended, m_deadline);
+        if (m_started)
+            WaitServingDde(m_shared->ended, m_deadline);
     }
 
     IpcChannel(const IpcChannel&) = delete;
@@ -113,6 +114,7 @@ public:
         } catch (const std::system_error&) {
             return false;
         }
+        m_started = true;
         return true;
     }
 
@@ -208,6 +210,7 @@ private:
 
     std::shared_ptr<Shared> m_shared;
     const Clock::time_point m_deadline;
+    bool m_started = false;
 };
 
 bool IsServiceNameUsable(const wxString& service)

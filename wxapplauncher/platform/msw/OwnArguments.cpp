@@ -33,3 +33,8 @@ bool ReadOwnArguments(std::vector<std::string>& args)
     LocalFree(words);
     return !args.empty();
 }
+
+std::string RawArgument(const wxString& argument)
+{
+    return ToUtf8(argument.wc_str());
+}

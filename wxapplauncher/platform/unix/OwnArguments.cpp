@@ -1,5 +1,7 @@
 #include "platform/OwnArguments.h"
 
+#include <wx/strconv.h>
+
 #include <fstream>
 #include <iterator>
 
@@ -19,4 +21,11 @@ bool ReadOwnArguments(std::vector<std::string>& args)
         start = end + 1;
     }
     return !args.empty();
+}
+
+// The bytes of the locale's character set, as the caller's shell passed them.
+std::string RawArgument(const wxString& argument)
+{
+    const wxCharBuffer bytes = wxSafeConvertWX2MB(argument.wc_str());
+    return bytes ? std::string(bytes.data()) : std::string();
 }
