@@ -11,10 +11,13 @@ scripts/build-win64.sh "$build" >/dev/null
 
 # The DLLs of Windows itself that a toolkit program may use; the universal C runtime's
 # api-ms-win-* sets are Windows' own as well.
-system_dlls=" advapi32.dll bcrypt.dll comctl32.dll comdlg32.dll crypt32.dll dwmapi.dll gdi32.dll
-    gdiplus.dll imm32.dll kernel32.dll msimg32.dll msvcrt.dll ntdll.dll ole32.dll oleacc.dll
-    oleaut32.dll rpcrt4.dll setupapi.dll shell32.dll shlwapi.dll ucrtbase.dll user32.dll
-    usp10.dll uxtheme.dll version.dll winmm.dll winspool.drv ws2_32.dll wsock32.dll "
+declare -A system_dll
+for dll in advapi32.dll bcrypt.dll comctl32.dll comdlg32.dll crypt32.dll dwmapi.dll gdi32.dll \
+    gdiplus.dll imm32.dll kernel32.dll msimg32.dll msvcrt.dll ntdll.dll ole32.dll oleacc.dll \
+    oleaut32.dll rpcrt4.dll setupapi.dll shell32.dll shlwapi.dll ucrtbase.dll user32.dll \
+    usp10.dll uxtheme.dll version.dll winhttp.dll winmm.dll winspool.drv ws2_32.dll wsock32.dll; do
+    system_dll[$dll]=1
+done
 
 foreign=0
 while IFS= read -r -d '' program; do
@@ -22,7 +25,7 @@ while IFS= read -r -d '' program; do
     printf '%-34s %9d bytes\n' "$name" "$(stat -c %s "$program")"
     while read -r dll; do
         lower="${dll,,}"
-        if [[ "$system_dlls" == *" $lower "* || "$lower" == api-ms-win-* ]]; then
+        if [[ -n "${system_dll[$lower]:-}" || "$lower" == api-ms-win-* ]]; then
             printf '    %s\n' "$dll"
         else
             printf '    %s   <- not a Windows DLL\n' "$dll"
