@@ -1,5 +1,7 @@
 #include "support/AccessibilityBus.h"
 
+#include "support/GuiWait.h"
+
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
@@ -54,8 +56,11 @@ std::string ReadLine(int fd, int timeoutMs)
 
 void Stop(pid_t pid)
 {
-    if (pid > 0) {
-        kill(pid, SIGTERM);
+    if (pid <= 0)
+        return;
+    kill(pid, SIGTERM);
+    if (!WaitFor([pid] { return waitpid(pid, nullptr, WNOHANG) == pid; }, 5000)) {
+        kill(pid, SIGKILL);
         waitpid(pid, nullptr, 0);
     }
 }
