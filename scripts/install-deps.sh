@@ -29,6 +29,11 @@ packages=(
     gettext
     librsvg2-bin
     binutils-mingw-w64-x86-64
+    g++-mingw-w64-x86-64-posix
+    mingw-w64-tools
+    libz-mingw-w64-dev
+    wine
+    wine64
     clang
     libclang-rt-14-dev
     libtsan2

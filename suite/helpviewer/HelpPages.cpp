@@ -1,13 +1,18 @@
 #include "HelpPages.h"
 
 #include <wx/filefn.h>
+#include <wx/filename.h>
 #include <wx/intl.h>
 
 namespace {
 
 wxString HelpFolder(const wxString& installDir, const wxString& language)
 {
-    return installDir + "/Documentation/" + language + "/Help/";
+    wxFileName folder = wxFileName::DirName(installDir);
+    folder.AppendDir("Documentation");
+    folder.AppendDir(language);
+    folder.AppendDir("Help");
+    return folder.GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR);
 }
 
 } // namespace
@@ -23,7 +28,7 @@ wxString FindHelpPage(const wxString& installDir, const wxString& applicationId,
     const wxString folder = HelpFolder(installDir, language);
     const wxString programFolder = applicationId == "LaunchPad" || applicationId.empty()
                                        ? folder
-                                       : folder + applicationId + "/";
+                                       : folder + applicationId + wxFILE_SEP_PATH;
     if (!page.empty() && wxFileExists(programFolder + page))
         return programFolder + page;
     return folder + "AlternateHelp.html";

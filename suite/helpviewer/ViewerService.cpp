@@ -1,10 +1,9 @@
 #include "ViewerService.h"
 
+#include "StandinProcess.h"
 #include "StandinRecord.h"
 
 #include <wx/app.h>
-
-#include <cstdlib>
 
 namespace {
 
@@ -47,8 +46,8 @@ wxConnectionBase* ViewerServer::OnAcceptConnection(const wxString& topic)
 
 void AppendViewerLog(const std::string& kind, const wxString& first, const wxString& second)
 {
-    const char* log = std::getenv("VELTRONA_HELP_LOG");
-    if (!log || !*log)
+    const std::string log = standin::EnvironmentValue("VELTRONA_HELP_LOG");
+    if (log.empty())
         return;
     std::string line = kind + "\t" + standin::EscapeField(std::string(first.utf8_str()));
     if (!second.empty())

@@ -3,6 +3,7 @@
 // is asked for from the installation's Documentation folder. A copy started
 // while another one serves leaves the pages to that one and ends.
 #include "HelpPages.h"
+#include "StandinProcess.h"
 #include "StandinRecord.h"
 #include "ViewerService.h"
 
@@ -10,9 +11,6 @@
 #include <wx/frame.h>
 #include <wx/html/htmlwin.h>
 #include <wx/log.h>
-
-#include <cstdlib>
-#include <unistd.h>
 
 namespace {
 
@@ -22,10 +20,11 @@ public:
     bool OnInit() override
     {
         wxLog::EnableLogging(false);
-        if (const char* log = std::getenv("VELTRONA_STANDIN_LOG"))
-            standin::AppendRecord(log,
-                                  standin::FormatRecord({std::string(argv[0].utf8_str())}, getpid(),
-                                                        standin::CurrentDirectory()));
+        const std::string log = standin::EnvironmentValue("VELTRONA_STANDIN_LOG");
+        if (!log.empty())
+            standin::AppendRecord(log, standin::FormatRecord({std::string(argv[0].utf8_str())},
+                                                             standin::ProcessId(),
+                                                             standin::CurrentDirectory()));
         m_installDir = wxString::FromUTF8(standin::CurrentDirectory());
 
         IpcClient client;

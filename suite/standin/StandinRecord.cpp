@@ -1,9 +1,5 @@
 #include "StandinRecord.h"
 
-#include <cerrno>
-#include <fcntl.h>
-#include <unistd.h>
-
 namespace standin {
 
 std::string EscapeField(const std::string& text)
@@ -40,31 +36,6 @@ std::string FormatRecord(const std::vector<std::string>& argv, long pid, const s
         record += key + "\t" + EscapeField(value) + "\n";
     record += "end\n";
     return record;
-}
-
-std::string CurrentDirectory()
-{
-    std::string buffer(256, '\0');
-    while (getcwd(buffer.data(), buffer.size()) == nullptr) {
-        if (errno != ERANGE)
-            return std::string();
-        buffer.resize(buffer.size() * 2);
-    }
-    buffer.resize(buffer.find('\0'));
-    return buffer;
-}
-
-bool AppendRecord(const std::string& path, const std::string& record)
-{
-    int fd = open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0644);
-    if (fd < 0)
-        return false;
-    ssize_t written;
-    do {
-        written = write(fd, record.data(), record.size());
-    } while (written < 0 && errno == EINTR);
-    bool whole = written == static_cast<ssize_t>(record.size());
-    return close(fd) == 0 && whole;
 }
 
 } // namespace standin

@@ -15,11 +15,13 @@ std::string EscapeField(const std::string& text);
 std::string FormatRecord(const std::vector<std::string>& argv, long pid, const std::string& cwd,
                          const std::vector<std::pair<std::string, std::string>>& extra = {});
 
-// The working directory, or an empty string when it cannot be read.
+// The working directory as UTF-8, or an empty string when it cannot be read.
 std::string CurrentDirectory();
 
-// Appends with one write(2) on an O_APPEND descriptor, so records of programs
-// started at the same moment never interleave.
+long ProcessId();
+
+// Appends with one write to a file opened for appending only, so records of
+// programs started at the same moment never interleave. The path is UTF-8.
 bool AppendRecord(const std::string& path, const std::string& record);
 
 } // namespace standin

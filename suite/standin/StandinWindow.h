@@ -1,4 +1,4 @@
-// The stand-in's window: a plain X11 top-level that says which program was
+// The stand-in's window: a plain top-level window that says which program was
 // started and with which arguments, and looks like the real module to anyone
 // searching for it by class and title.
 #pragma once
@@ -15,11 +15,17 @@ struct WindowIdentity
 };
 
 // What the window calls itself for a program of the given base name.
-WindowIdentity IdentityFor(const std::string& baseName);
+inline WindowIdentity IdentityFor(const std::string& baseName)
+{
+    if (baseName == "ZelVerifyStudio.exe")
+        return {"TFrm_Main", "Zel Verify Studio"};
+    return {"VeltronaStandin", baseName};
+}
 
-// Shows the window and runs until it is closed. readyFile, when not empty,
-// receives the window id once the window is mapped. Returns the exit status:
-// 0 when closed, 1 when there is no display.
+// Shows the window and runs until it is closed. readyFile (UTF-8), when not
+// empty, receives the window's id in decimal (the X window id, or the HWND)
+// once the window is shown. Returns the exit status: 0 when closed, 1 when no
+// window could be shown (no display).
 int RunWindow(const std::string& baseName, const std::vector<std::string>& args,
               const std::string& readyFile);
 

@@ -7,8 +7,9 @@
 
 namespace standin {
 
-// "Silent" from the user's settings file, else from the system-wide one; the
-// files are found as the launcher finds them. Empty when neither has it.
+// "Silent" from the user's settings, else from the system-wide ones, found as
+// the launcher finds them (files, or the registry), as text: a number in
+// decimal. Empty when neither has it.
 std::optional<std::string> FindSilentSetting();
 
 } // namespace standin

@@ -32,16 +32,6 @@ class Simulator
 public:
     Simulator() : m_state(StateFromEnvironment()), m_thread([this] { Deliver(); }) {}
 
-    ~Simulator()
-    {
-        {
-            std::lock_guard<std::mutex> lock(m_mutex);
-            m_stopping = true;
-        }
-        m_changed.notify_all();
-        m_thread.join();
-    }
-
     std::mutex m_mutex;
     std::condition_variable m_changed;
     int m_state;
@@ -53,7 +43,6 @@ public:
     std::string m_optionLog;
     std::deque<std::pair<int, int>> m_queue;
     bool m_delivering = false;
-    bool m_stopping = false;
 
 private:
     std::thread m_thread;
@@ -62,9 +51,7 @@ private:
     {
         std::unique_lock<std::mutex> lock(m_mutex);
         for (;;) {
-            m_changed.wait(lock, [this] { return m_stopping || !m_queue.empty(); });
-            if (m_stopping)
-                return;
+            m_changed.wait(lock, [this] { return !m_queue.empty(); });
             const std::pair<int, int> notification = m_queue.front();
             m_queue.pop_front();
             const VaroNotifyCallback callback = m_callback;
@@ -79,9 +66,12 @@ private:
     }
 };
 
+// Never destroyed: its thread ends with the process. Joining it while the library
+// is taken down would deadlock on Windows, which does that under its loader lock
+// after it has already ended every other thread.
 Simulator& Sim()
 {
-    static Simulator simulator;
+    static Simulator& simulator = *new Simulator;
     return simulator;
 }
 

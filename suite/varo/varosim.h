@@ -9,7 +9,11 @@
 extern "C" {
 #endif
 
+#ifdef _WIN32
+#define VARO_EXPORT // Varo.def names what the DLL exports
+#else
 #define VARO_EXPORT __attribute__((visibility("default")))
+#endif
 
 typedef void (*VaroNotifyCallback)(int code, int data);
 

@@ -62,13 +62,6 @@ void Draw(Display* display, Window window, GC gc, const std::vector<std::string>
 
 } // namespace
 
-WindowIdentity IdentityFor(const std::string& baseName)
-{
-    if (baseName == "ZelVerifyStudio.exe")
-        return {"TFrm_Main", "Zel Verify Studio"};
-    return {"VeltronaStandin", baseName};
-}
-
 int RunWindow(const std::string& baseName, const std::vector<std::string>& args,
               const std::string& readyFile)
 {
