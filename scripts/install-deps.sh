@@ -44,6 +44,7 @@ packages=(
     libatspi2.0-dev
     dbus
     dbus-bin
+    dbus-x11
     lintian
     desktop-file-utils
     appstream

@@ -2,7 +2,8 @@
 // a real click on a module button until the module's process exists, against
 // starting the same program with posix_spawn; and the CPU time of one hover
 // repaint of a module button, against a repaint that only blits its buffer.
-// Runs in the demo installation (the working directory), on an X display.
+// Runs in the demo installation (the working directory), on an X display; its own files
+// go to a folder of its own, removed after.
 #include "controls/ZelStaticBitmap.h"
 #include "frame/Veltro3AppFrame.h"
 #include "frame/Veltro3MainAppStandardView.h"
@@ -20,6 +21,7 @@
 #include <chrono>
 #include <cstdio>
 #include <ctime>
+#include <filesystem>
 #include <fstream>
 #include <functional>
 #include <set>
@@ -58,12 +60,12 @@ double ThreadCpu()
 
 // The stand-ins' start log: a stand-in writes its pid there first thing, so
 // a module counts as started once its record is there.
-const char kLog[] = "bench-starts.log";
+std::string g_log;
 
 off_t LogSize()
 {
     struct stat st = {};
-    return stat(kLog, &st) == 0 ? st.st_size : 0;
+    return stat(g_log.c_str(), &st) == 0 ? st.st_size : 0;
 }
 
 // Handles events until the condition holds, at most `timeoutMs`. Polling
@@ -99,9 +101,14 @@ int main(int argc, char** argv)
         return 2;
     }
     wxLog::EnableLogging(false);
+    std::string dir = (std::filesystem::temp_directory_path() / "view-bench-XXXXXX").string();
+    if (!mkdtemp(dir.data())) {
+        perror("view_bench: mkdtemp");
+        return 2;
+    }
+    g_log = dir + "/starts.log";
     setenv("VELTRONA_STANDIN_EXIT", "1", 1);
-    unlink(kLog);
-    setenv("VELTRONA_STANDIN_LOG", kLog, 1);
+    setenv("VELTRONA_STANDIN_LOG", g_log.c_str(), 1);
 
     int status = 0;
     {
@@ -214,5 +221,6 @@ int main(int argc, char** argv)
         Until([] { return false; }, 100);
     }
     wxEntryCleanup();
+    std::filesystem::remove_all(dir);
     return status;
 }

@@ -6,15 +6,40 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cerrno>
 #include <csignal>
+#include <cstring>
 #include <filesystem>
+#include <fstream>
 #include <memory>
+#include <optional>
 #include <sched.h>
+#include <sstream>
 #include <sys/mount.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 namespace {
+
+// Whether the topmost mount at `point` is shared, i.e. mounts made on it reach other
+// namespaces; none when this process's root shows no mount there (a chroot that is no
+// mount point itself shows no "/").
+std::optional<bool> SharedMountAt(const std::string& point)
+{
+    std::ifstream info("/proc/self/mountinfo");
+    std::optional<bool> shared;
+    for (std::string line; std::getline(info, line);) {
+        std::istringstream fields(line);
+        std::string id, parent, device, root, mountPoint, options, tag;
+        fields >> id >> parent >> device >> root >> mountPoint >> options;
+        if (mountPoint != point)
+            continue;
+        shared = false;
+        while (fields >> tag && tag != "-")
+            shared = *shared || tag.rfind("shared:", 0) == 0;
+    }
+    return shared;
+}
 
 TEST(InstanceLockTest, TenCopiesAtOnceGiveOneAndAKilledCopyBlocksNone)
 {
@@ -46,7 +71,24 @@ TEST(InstanceLockTest, WithoutARuntimeDirATakenTmpFolderStillGivesOneCopy)
     // test's own, so that it troubles nobody else; /tmp itself may hold the build.
     if (unshare(CLONE_NEWNS) != 0)
         GTEST_SKIP() << "needs root";
-    ASSERT_EQ(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr), 0);
+    // The mount that holds /tmp is made private, so that the bind does not reach the
+    // namespace outside. In a chroot that mount may lie outside the root, out of reach:
+    // /tmp then becomes a mount of its own, bound onto itself, unless that bind itself
+    // already reached outside.
+    std::string holder = SharedMountAt("/tmp") ? "/tmp" : "/";
+    if (!SharedMountAt(holder)) {
+        ASSERT_EQ(mount("/tmp", "/tmp", nullptr, MS_BIND, nullptr), 0) << std::strerror(errno);
+        const std::optional<bool> shared = SharedMountAt("/tmp");
+        ASSERT_TRUE(shared) << "/proc/self/mountinfo does not show the bind onto /tmp";
+        if (*shared) {
+            umount("/tmp");
+            GTEST_SKIP() << "/tmp lies in a mount shared with namespaces outside this root, "
+                            "which cannot be made private from inside it";
+        }
+        holder = "/tmp";
+    }
+    ASSERT_EQ(mount(nullptr, holder.c_str(), nullptr, MS_REC | MS_PRIVATE, nullptr), 0)
+        << holder << ": " << std::strerror(errno);
     StandinDir install({});
     const EnvList env = {{"XDG_RUNTIME_DIR", ""}, {"XDG_CACHE_HOME", install.Path() + "/cache"}};
     const std::string path = "/tmp/veltrona-" + std::to_string(getuid());

@@ -1,4 +1,5 @@
 // The real launcher as a keyboard user, a screen reader and an input method see it.
+#include "support/AccessibilityBus.h"
 #include "support/DesktopTools.h"
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
@@ -10,8 +11,6 @@
 #include <wx/image.h>
 
 #include <algorithm>
-#include <csignal>
-#include <cstdio>
 #include <cstdlib>
 #include <memory>
 
@@ -54,17 +53,8 @@ std::vector<Button> Buttons()
 
 TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
 {
-    // A session bus of the test's own, where the accessibility bus starts.
-    FILE* daemon = popen("dbus-daemon --session --fork --print-address=1 --print-pid=1", "r");
-    char address[512] = {};
-    int busPid = 0;
-    ASSERT_EQ(std::fscanf(daemon, "%511s %d", address, &busPid), 2);
-    pclose(daemon);
-    const std::shared_ptr<void> stopBus(nullptr, [busPid](void*) { kill(busPid, SIGTERM); });
-    setenv("DBUS_SESSION_BUS_ADDRESS", address, 1);
-    // The display's accessibility bus wins over the session's; one that an earlier
-    // launcher left there lived in a runtime folder that is gone.
-    std::system("xprop -root -remove AT_SPI_BUS");
+    auto bus = std::make_unique<AccessibilityBus>();
+    ASSERT_EQ(bus->Failure(), "");
     atspi_init();
     StandinDir install(kModules);
     const std::string log = install.Path() + "/starts.log";
@@ -86,7 +76,8 @@ TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
         ProbeRun run(install.Path(), {}, {{"LANG", lang}});
         ASSERT_TRUE(run.WaitForShown()) << lang;
         std::vector<Button> buttons;
-        WaitFor([&] { return (buttons = Buttons()).size() == names.size(); });
+        EXPECT_TRUE(WaitFor([&] { return (buttons = Buttons()).size() == names.size(); }))
+            << lang << ": the launcher's buttons on the accessibility bus";
         std::vector<std::string> found;
         AtspiAction* action = nullptr;
         for (const Button& b : buttons) {
@@ -107,16 +98,18 @@ TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
 
         // Tab walks the buttons in reading order, round and round; Space presses Printer.
         const unsigned long window = run.Window();
+        ASSERT_NE(window, 0u) << lang << ": the launcher's window";
         std::string focused;
         auto tab = [&] {
             const std::string before = focused;
             TypeKeys(window, "Tab");
-            WaitFor([&] {
+            const bool moved = WaitFor([&] {
                 for (const Button& b : Buttons())
                     if (b.focused && b.name != before)
                         return !(focused = b.name).empty();
                 return false;
             });
+            EXPECT_TRUE(moved) << lang << ": focus on a button after " << before;
             return focused;
         };
         for (size_t i = 0; i <= names.size() && focused != names[0]; ++i)
@@ -131,6 +124,8 @@ TEST(KeyboardAndReaderTest, ButtonsAnswerScreenReadersAndKeys)
         TypeKeys(window, "Tab Return");
         expectStarted(1);
     }
+    // The bus's daemons are children of the test, which SettledRecords waits for too.
+    bus.reset();
     EXPECT_EQ(SettledRecords(log).size(), started);
 }
 

@@ -1,10 +1,10 @@
 // The user guide and the web pages, opened through a test desktop of its own:
 // XDG folders in which a stand-in PDF reader is registered (or not), and an
 // opener on PATH that is the real xdg-open, a stand-in, or one that fails.
+#include "platform/UserLanguage.h"
 #include "controls/ZelLinkText.h"
 #include "help/CAcrobatNotFoundDialog.h"
 #include "help/Documentation.h"
-#include "platform/UserLanguage.h"
 #include "resources/Catalogs.h"
 #include "support/DialogRecorder.h"
 #include "support/GuiWait.h"

@@ -5,8 +5,14 @@
 set -euo pipefail
 build="$1"
 work="$(mktemp -d "${TMPDIR:-/tmp}/installed-tree.XXXXXX")"
-launcher=""
-trap '[ -z "$launcher" ] || kill "$launcher" 2>/dev/null; rm -rf "$work"' EXIT
+# Ends whatever still runs from the installed tree (the launcher, its help viewer, modules).
+end_installed() {
+    local exe
+    for exe in /proc/[0-9]*/exe; do
+        [[ "$(readlink "$exe" 2>/dev/null)" != "$work/"* ]] || kill "${exe//[^0-9]/}" 2>/dev/null || true
+    done
+}
+trap 'end_installed; rm -rf "$work"' EXIT
 fail() { echo "FAIL: $*" >&2; exit 1; }
 
 prefix="/opt/Veltrona \"suite\" it's"
@@ -31,6 +37,9 @@ mkdir -m 700 "$work/run"
 export XDG_RUNTIME_DIR="$work/run" XDG_CONFIG_HOME="$work/config" XDG_DATA_HOME="$work/data"
 export XDG_DATA_DIRS="$work/share:/usr/share" PATH="$root/bin:$PATH"
 export VELTRONA_STANDIN_LOG="$work/standins.log" VELTRONA_STANDIN_EXIT=1
+# No session or accessibility bus: with none named, GIO would start one through dbus-launch
+# and leave it on the display.
+export DBUS_SESSION_BUS_ADDRESS=disabled: NO_AT_BRIDGE=1
 
 # Runs "$@" until it succeeds, for at most 20 seconds.
 wait_until() {
@@ -49,7 +58,6 @@ find_launcher() {
 close_launcher() {
     wmctrl -i -c "$window"
     timeout 20 tail --pid="$launcher" -f /dev/null || fail "the launcher did not close"
-    launcher=""
 }
 # Whether a stand-in record shows $1 started (with the argument $2, when given).
 started() {
@@ -67,7 +75,8 @@ class="$(xprop -id "$window" WM_CLASS | sed -n 's/.*, "\(.*\)"$/\1/p')"
 grep -qx "StartupWMClass=$class" "$root/share/applications/veltrona.desktop" ||
     fail "StartupWMClass is not the window class $class"
 # The middle of the Printer button, below the menu bar.
-xdotool windowactivate --sync "$window" mousemove --window "$window" 304 123 click 1
+timeout 20 xdotool windowactivate --sync "$window" mousemove --window "$window" 304 123 click 1 ||
+    fail "the launcher's window did not become active"
 wait_until started "Quenta Print Studio.exe" || fail "the Printer button started nothing"
 xdotool key F1
 wait_until started "Help/Veltrona Help.exe" || fail "F1 did not start the help viewer"
@@ -76,11 +85,11 @@ close_launcher
 
 # A profile opened the way a file manager opens it reaches the Inspect module whole.
 update-desktop-database "$root/share/applications"
-[ "$(xdg-mime query default application/vnd.iccprofile)" = veltrona.desktop ] ||
+[ "$(timeout 20 xdg-mime query default application/vnd.iccprofile)" = veltrona.desktop ] ||
     fail "veltrona.desktop does not open colour profiles"
 profile="$work/Proof \"A3\" it's.icc"
 { head -c 36 /dev/zero; printf acsp; head -c 88 /dev/zero; } >"$profile"
-gio open "$profile"
+timeout 20 gio open "$profile" || fail "gio open $profile"
 wait_until started "Quenta Inspect Studio.exe" "$profile" || fail "Inspect did not get $profile"
 find_launcher
 close_launcher
