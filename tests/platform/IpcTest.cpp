@@ -1,5 +1,4 @@
-// The IPC layer's sockets and the checks on what a peer pokes (connections that
-// end on their deadline: RaiseServiceTest).
+// The IPC layer's sockets (connections that end on their deadline: RaiseServiceTest).
 #include "platform/Ipc.h"
 #include "support/StandinDir.h"
 
@@ -74,32 +73,6 @@ TEST(IpcTest, ServerRemovesOnlyItsOwnSocket)
     EXPECT_EQ(after.st_ino, before.st_ino);
     newer.reset();
     EXPECT_FALSE(fs::exists(path));
-}
-
-// What a peer pokes counts only as bounded, valid text, up to its first NUL.
-TEST(IpcTest, PokeTextOnlyFromBoundedValidText)
-{
-    const std::string longText = "LaunchPad$" + std::string(2000, 'p') + "*ü.html";
-    const struct
-    {
-        std::string bytes;
-        wxIPCFormat format;
-        bool accepted;
-        std::string text;
-    } pokes[] = {
-        {longText + '\0', wxIPC_UTF8TEXT, true, longText},
-        {std::string("Exit\0more", 9), wxIPC_TEXT, true, "Exit"},
-        {"Raise\xff\xfe", wxIPC_UTF8TEXT, false, ""},
-        {std::string("R\0\0\0\0\0\0\0", 8), wxIPC_UNICODETEXT, false, ""},
-        {std::string(64 * 1024 + 1, 'x'), wxIPC_TEXT, false, ""},
-    };
-    for (const auto& poke : pokes) {
-        SCOPED_TRACE(testing::Message() << &poke - pokes);
-        wxString text = "stale";
-        EXPECT_EQ(ReadPokeText(poke.bytes.data(), poke.bytes.size(), poke.format, text),
-                  poke.accepted);
-        EXPECT_EQ(text.utf8_string(), poke.text);
-    }
 }
 
 } // namespace
