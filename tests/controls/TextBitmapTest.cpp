@@ -53,8 +53,8 @@ TEST(TextBitmapTest, DrawsText)
                                          [](int c) { return c == 255; }))
             ADD_FAILURE() << "not flat at " << i;
     // The same shape: wherever white text covers more, black text covers at least about as
-    // much. (Windows' GDI antialiases dark text on light with another gamma than light text
-    // on dark: the coverage differs by up to half, its order does not.)
+    // much. (GDI, Wine's at least, antialiases dark text on light with another gamma than
+    // light text on dark: the coverage differs by up to half, its order does not.)
     std::vector<int> least(256, 255), most(256, 0);
     for (long i = 0; i < n; ++i) {
         least[alpha[i]] = std::min(least[alpha[i]], int(black.GetAlpha()[i]));

@@ -1,11 +1,14 @@
 // The real Veltrona.exe's resources as Windows itself reads them: the nine catalogues,
 // the icon group "IDI_ICON1" and the version; and the launcher's own readers over the
-// same calls (the test program carries the same resources).
+// same calls (the test program carries the same resources), and the modules' versions.
+#include "about/ModuleInfo.h"
 #include "about/VersionInfo.h"
 #include "platform/ResourceImage.h"
 #include "resources/CatalogFormat.h"
+#include "support/StandinDir.h"
 
 #include <gtest/gtest.h>
+#include <wx/filefn.h>
 
 #include <windows.h>
 
@@ -81,6 +84,19 @@ TEST(ExecutableResourceTest, CataloguesIconGroupAndVersionThroughTheSystem)
     EXPECT_EQ(GetLauncherVersion(), "3.1.2.01");
     EXPECT_NE(ResourceImage::OfExecutable().Find(ResourceTypeRcData, "zh_cn/veltro.mo"), nullptr)
         << "names ignore case";
+}
+
+// About Modules reads each module's product version through the version API.
+TEST(ExecutableResourceTest, ModuleVersionsThroughTheSystem)
+{
+    StandinDir install({"Quenta Print Studio.exe", "Monitor\\Zel Display Studio.exe"});
+    wxSetWorkingDirectory(install.Path());
+    const wxArrayString print = ModuleInfoLines(1025), monitor = ModuleInfoLines(1026),
+                        verify = ModuleInfoLines(1030);
+    ASSERT_TRUE(print.size() == 7 && monitor.size() == 7 && verify.size() == 7);
+    EXPECT_EQ(print[2] + "|" + print[3], "Quenta Print Studio|Version 3.1.0.07");
+    EXPECT_EQ(monitor[2] + "|" + monitor[3], "Zel Display Studio|Version 3.1.0.07");
+    EXPECT_EQ(verify[2] + "|" + verify[3], "Zel Verify Studio|Version N/A") << "not installed";
 }
 
 } // namespace

@@ -129,9 +129,9 @@ TEST(HandOverTest, WholePathsReachInspectAndFailuresEndWithAStatus)
     } cases[] = {
         {First::Launcher, blanks, 0},
         {First::Launcher, longPath, 0},
-        // Another program's window hangs. Starting a conversation waits for every top-level
-        // window (Wine as Windows), so the hand-over may fail: the copy still ends, and its
-        // status says what happened.
+        // Another program's window hangs. Starting a conversation sends to every top-level
+        // window, and under Wine that waits for the hung one, so the hand-over fails there:
+        // the copy still ends, and its status says what happened.
         {First::HungWindow, blanks, kEither},
         // Connected, then the poke never returns: the copy gives up at its own deadline.
         {First::HungService, blanks, 1},
