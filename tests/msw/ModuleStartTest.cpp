@@ -1,6 +1,7 @@
 // Modules as the stand-ins receive them on Windows: each button clicked through its
-// window's own messages, pressed with Space, or its File command, from an installation
-// folder with a blank in its path; and the Verify raise through FindWindowW.
+// window's own messages, pressed with Space, its File command, or a screen reader's
+// default action through MSAA, from an installation folder with a blank in its path;
+// and the Verify raise through FindWindowW.
 #include "controls/ZelStaticBitmap.h"
 #include "frame/DragNDrop.h"
 #include "frame/Veltro3AppFrame.h"
@@ -8,6 +9,7 @@
 #include "platform/UserLanguage.h"
 #include "support/DialogRecorder.h"
 #include "support/GuiWait.h"
+#include "support/ProbeRun.h"
 #include "support/ScopedEnv.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
@@ -17,10 +19,14 @@
 #include <wx/utils.h>
 
 #include <windows.h>
+
+#include <oleacc.h>
 // The toolkit's names back from the system's macros (FindWindow).
 #include <wx/msw/winundef.h>
 
+#include <algorithm>
 #include <fstream>
+#include <map>
 #include <tuple>
 
 namespace {
@@ -138,6 +144,109 @@ TEST_F(ModuleStartTest, RunningVerifyIsRestoredInsteadOfStarted)
         EXPECT_TRUE(SettledRecords(m_log, pid).empty());
     }
     wxKill(pid, wxSIGKILL);
+}
+
+// What a screen reader learns of one child window of the launcher through MSAA.
+struct ReaderButton
+{
+    std::string name;
+    std::string defaultAction;
+    IAccessible* accessible; // released by the caller
+};
+
+// The push buttons among the launcher's child windows, asked from this process: the
+// answers come from the launcher's process, marshalled by oleacc.
+std::vector<ReaderButton> ReaderButtons(HWND frame)
+{
+    std::vector<HWND> children;
+    EnumChildWindows(
+        frame,
+        [](HWND child, LPARAM list) -> BOOL {
+            reinterpret_cast<std::vector<HWND>*>(list)->push_back(child);
+            return TRUE;
+        },
+        reinterpret_cast<LPARAM>(&children));
+    std::vector<ReaderButton> buttons;
+    VARIANT self;
+    self.vt = VT_I4;
+    self.lVal = CHILDID_SELF;
+    for (const HWND child : children) {
+        IAccessible* accessible = nullptr;
+        if (FAILED(AccessibleObjectFromWindow(child, DWORD(OBJID_CLIENT), __uuidof(IAccessible),
+                                              reinterpret_cast<void**>(&accessible))))
+            continue;
+        VARIANT role;
+        VariantInit(&role);
+        BSTR name = nullptr, action = nullptr;
+        if (accessible->get_accRole(self, &role) == S_OK && role.vt == VT_I4 &&
+            role.lVal == ROLE_SYSTEM_PUSHBUTTON && accessible->get_accName(self, &name) == S_OK &&
+            accessible->get_accDefaultAction(self, &action) == S_OK) {
+            buttons.push_back(
+                {wxString(name).utf8_string(), wxString(action).utf8_string(), accessible});
+            accessible = nullptr;
+        }
+        SysFreeString(name);
+        SysFreeString(action);
+        VariantClear(&role);
+        if (accessible)
+            accessible->Release();
+    }
+    return buttons;
+}
+
+// The launcher in another process, as a screen reader sees it: each module button and
+// Help a push button named by its translated label, "click" its default action, which
+// starts the module.
+TEST(ScreenReaderTest, ButtonsAnswerThroughMsaaAndTheirActionStartsTheModule)
+{
+    CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
+    StandinDir install(kModules);
+    const std::string log = install.Path() + "\\starts.log";
+    const std::map<std::string, std::string> exes = {
+        {"Printer", kModules[0]}, {"Monitor", kModules[1]}, {"Device Link", kModules[2]},
+        {"Verify", kModules[3]},  {"Inspect", kModules[4]}, {"Edit", kModules[5]}};
+    // The user's language, as Windows says it (Wine: that of the prefix), not LANG.
+    const std::vector<std::string> names = {"Device Link", "Edit",    "Help",  "Inspect",
+                                            "Monitor",     "Printer", "Verify"};
+    size_t started = 0;
+    { // The launcher ends before the starts are counted.
+        ProbeRun run(install.Path(), {},
+                     {{"VELTRONA_STANDIN_LOG", log}, {"VELTRONA_STANDIN_EXIT", "1"}});
+        ASSERT_TRUE(run.WaitForShown(60000)) << "the launcher's frame";
+        const HWND frame = reinterpret_cast<HWND>(uintptr_t(run.Window()));
+        ASSERT_TRUE(frame) << "the launcher's window";
+        std::vector<ReaderButton> buttons;
+        EXPECT_TRUE(WaitFor([&] {
+            for (const ReaderButton& button : buttons)
+                button.accessible->Release();
+            buttons = ReaderButtons(frame);
+            return buttons.size() == names.size();
+        })) << "the launcher's buttons through MSAA";
+        std::vector<std::string> found;
+        for (const ReaderButton& button : buttons) {
+            found.push_back(button.name);
+            EXPECT_EQ(button.defaultAction, "click") << button.name;
+        }
+        std::sort(found.begin(), found.end());
+        EXPECT_EQ(found, names);
+
+        // Every module button's action starts its module.
+        for (const ReaderButton& button : buttons) {
+            const auto exe = exes.find(button.name);
+            if (exe != exes.end()) {
+                VARIANT self;
+                self.vt = VT_I4;
+                self.lVal = CHILDID_SELF;
+                EXPECT_EQ(button.accessible->accDoDefaultAction(self), S_OK) << button.name;
+                const auto records = WaitForRecords(log, ++started);
+                ASSERT_EQ(records.size(), started) << button.name;
+                EXPECT_EQ(records.back().exe, install.Path() + "\\" + exe->second);
+            }
+            button.accessible->Release();
+        }
+    }
+    EXPECT_EQ(SettledRecords(log).size(), started);
+    CoUninitialize();
 }
 
 } // namespace
