@@ -28,7 +28,7 @@ fuzz() {
 
 build resource_fuzz "$src/tests/fuzz/ResourceFuzz.cpp" \
     "$src"/wxapplauncher/platform/{ResourceImage,IconResource,PeResource,VersionResource}.cpp \
-    "$src"/wxapplauncher/platform/unix/ElfResources.cpp \
+    "$src"/wxapplauncher/platform/unix/{ElfResources,ResourceIcon}.cpp \
     "$src"/wxapplauncher/resources/{CatalogFormat,IconBundle}.cpp
 build ipc_fuzz "$src/tests/fuzz/IpcFuzz.cpp" \
     "$src"/wxapplauncher/platform/PokeText.cpp \
