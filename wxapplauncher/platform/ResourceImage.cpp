@@ -6,6 +6,10 @@
 #include <fstream>
 #include <limits>
 
+#include <fcntl.h>
+#include <sys/mman.h>
+#include <unistd.h>
+
 namespace {
 
 // Appends one code point as UTF-8.
@@ -109,8 +113,8 @@ bool MemoryByteSource::Read(std::uint64_t offset, void* out, std::size_t count) 
     return true;
 }
 
-bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
-                    std::vector<unsigned char>& contents)
+bool FindElfSection(const ByteSource& source, const std::string& sectionName, std::uint64_t& offset,
+                    std::uint64_t& size)
 {
     unsigned char ident[64];
     static const unsigned char magic[4] = {0x7F, 'E', 'L', 'F'};
@@ -168,10 +172,21 @@ bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
         if (s.type == noBits || s.offset > source.Size() || s.size > source.Size() - s.offset ||
             s.size > std::numeric_limits<std::size_t>::max())
             return false;
-        contents.resize(std::size_t(s.size));
-        return source.Read(s.offset, contents.data(), contents.size());
+        offset = s.offset;
+        size = s.size;
+        return true;
     }
     return false;
+}
+
+bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
+                    std::vector<unsigned char>& contents)
+{
+    std::uint64_t offset = 0, size = 0;
+    if (!FindElfSection(source, sectionName, offset, size))
+        return false;
+    contents.resize(std::size_t(size));
+    return source.Read(offset, contents.data(), contents.size());
 }
 
 bool ReadElfSectionOfFile(const std::string& path, const std::string& sectionName,
@@ -180,17 +195,35 @@ bool ReadElfSectionOfFile(const std::string& path, const std::string& sectionNam
     return ReadElfSection(FileByteSource(path), sectionName, contents);
 }
 
-ResourceImage::ResourceImage(std::vector<unsigned char> bytes) : m_bytes(std::move(bytes))
+ResourceImage::ResourceImage(std::vector<unsigned char> bytes)
+    : m_bytes(std::move(bytes)), m_data(m_bytes.data()), m_size(m_bytes.size())
 {
     Parse();
 }
 
 ResourceImage ResourceImage::FromElfFile(const std::string& path)
 {
-    std::vector<unsigned char> bytes;
-    if (!ReadElfSectionOfFile(path, ".rsrc", bytes))
+    std::uint64_t offset = 0, size = 0;
+    if (!FindElfSection(FileByteSource(path), ".rsrc", offset, size) || size == 0)
         return ResourceImage();
-    return ResourceImage(std::move(bytes));
+    // Mapped rather than read: only the pages of the resources in use are ever loaded,
+    // and none of them is held twice.
+    const int fd = open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    if (fd < 0)
+        return ResourceImage();
+    const std::uint64_t page = std::uint64_t(sysconf(_SC_PAGESIZE));
+    const std::uint64_t start = offset / page * page;
+    const std::size_t length = std::size_t(size + (offset - start));
+    void* mapped = mmap(nullptr, length, PROT_READ, MAP_PRIVATE, fd, off_t(start));
+    close(fd);
+    if (mapped == MAP_FAILED)
+        return ResourceImage();
+    ResourceImage image;
+    image.m_mapping.reset(mapped, [length](void* region) { munmap(region, length); });
+    image.m_data = static_cast<const unsigned char*>(mapped) + (offset - start);
+    image.m_size = std::size_t(size);
+    image.Parse();
+    return image;
 }
 
 const ResourceImage& ResourceImage::OfExecutable()
@@ -204,8 +237,8 @@ const ResourceImage& ResourceImage::OfExecutable()
 // language, version and characteristics; the data follows, padded to 4.
 void ResourceImage::Parse()
 {
-    const unsigned char* base = m_bytes.data();
-    const std::size_t size = m_bytes.size();
+    const unsigned char* base = m_data;
+    const std::size_t size = m_size;
     std::size_t pos = 0;
     while (size - pos >= 8) {
         const std::uint32_t dataSize = Le32(base + pos);

@@ -6,6 +6,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <fstream>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -69,14 +70,16 @@ private:
     std::uint64_t m_size = 0;
 };
 
-// The contents of the named section of an ELF file (32 or 64 bit, little-endian);
-// false when the file is no such ELF file, lacks the section or is malformed.
+// Where the named section of an ELF file (32 or 64 bit, little-endian) lies in it, and
+// its contents; false when the file is no such ELF file, lacks the section or is malformed.
+bool FindElfSection(const ByteSource& source, const std::string& sectionName, std::uint64_t& offset,
+                    std::uint64_t& size);
 bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
                     std::vector<unsigned char>& contents);
 bool ReadElfSectionOfFile(const std::string& path, const std::string& sectionName,
                           std::vector<unsigned char>& contents);
 
-// A parsed .res image. It owns its bytes, so entries stay valid as long as the image:
+// A parsed .res image. It holds its bytes, so entries stay valid as long as the image:
 // finding a resource also loads and locks it, and nothing has to be freed.
 class ResourceImage
 {
@@ -89,7 +92,9 @@ public:
     ResourceImage(ResourceImage&&) = default;
     ResourceImage& operator=(ResourceImage&&) = default;
 
-    // The resources of an ELF file's ".rsrc" section; empty when there are none.
+    // The resources of an ELF file's ".rsrc" section; empty when there are none. The
+    // section is mapped, so the file must not change while the image lives (a running
+    // executable cannot).
     static ResourceImage FromElfFile(const std::string& path);
     // The running executable's resources, read once per process.
     static const ResourceImage& OfExecutable();
@@ -105,5 +110,8 @@ private:
     void Parse();
 
     std::vector<unsigned char> m_bytes;
+    std::shared_ptr<void> m_mapping;
+    const unsigned char* m_data = nullptr;
+    std::size_t m_size = 0;
     std::vector<ResourceEntry> m_entries;
 };
