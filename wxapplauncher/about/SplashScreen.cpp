@@ -13,6 +13,7 @@
 #include <wx/utils.h>
 
 #include <algorithm>
+#include <cstring>
 
 namespace {
 
@@ -97,6 +98,21 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     CentreOnPrimaryDisplay(this, size);
     ShapeToPicture(this, m_background);
 
+    const int perLine = startup ? kStartupPixelsPerLine : kAboutPixelsPerLine;
+    const int height = std::min(int(lines.size()), windowLineCount) * perLine;
+    const wxFont font = SplashTextFont(this);
+    m_scale = std::max(1, wxRound(scale));
+    {
+        // Of the text only its coverage is kept, a byte a pixel: its colour is one for all.
+        // Rendered before the blend, so that its buffers and the blend's never coexist.
+        const wxImage text = DrawTextLinesToImage(wxDefaultSize, wxDefaultPosition, font, lines,
+                                                  m_colour, 0, -1, scale);
+        if (text.IsOk() && text.HasAlpha()) {
+            m_textSize = text.GetSize();
+            m_textAlpha.assign(text.GetAlpha(),
+                               text.GetAlpha() + std::size_t(m_textSize.x) * m_textSize.y);
+        }
+    }
     // Without children the window itself must take the keyboard focus, or keys never reach it.
     SetCanFocus(true);
     SetFocus();
@@ -106,20 +122,6 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
         top->Update();
     BlendWithScreen();
 
-    const int perLine = startup ? kStartupPixelsPerLine : kAboutPixelsPerLine;
-    const int height = std::min(int(lines.size()), windowLineCount) * perLine;
-    const wxFont font = SplashTextFont(this);
-    m_scale = std::max(1, wxRound(scale));
-    {
-        // Of the text only its coverage is kept, a byte a pixel: its colour is one for all.
-        const wxImage text = DrawTextLinesToImage(wxDefaultSize, wxDefaultPosition, font, lines,
-                                                  m_colour, 0, -1, scale);
-        if (text.IsOk() && text.HasAlpha()) {
-            m_textSize = text.GetSize();
-            m_textAlpha.assign(text.GetAlpha(),
-                               text.GetAlpha() + std::size_t(m_textSize.x) * m_textSize.y);
-        }
-    }
     // Left to the theme, each device context made on the window, two per paint, would look
     // the window's font and colours up in it again.
     SetOwnFont(font);
@@ -183,18 +185,18 @@ ZelSplashScreen::~ZelSplashScreen()
 
 void ZelSplashScreen::BlendWithScreen()
 {
-    if (!m_background.IsOk())
+    if (!m_background.IsOk() || !m_background.HasAlpha())
         return;
-    wxImage blended;
+    // Without a capture (no X11 desktop) the picture is shown unblended. Captured first:
+    // the server's reply is gone before the picture is converted.
+    wxImage blended = CaptureScreen(wxRect(GetPosition(), m_background.GetLogicalSize()));
+    if (!blended.IsOk() || !blended.GetData() || blended.GetSize() != m_background.GetSize())
+        return;
     {
         const wxImage picture = m_background.ConvertToImage();
         if (!picture.IsOk() || !picture.HasAlpha() || !picture.GetData())
             return;
         const int width = picture.GetWidth(), height = picture.GetHeight();
-        // Without a capture (no X11 desktop) the picture is shown unblended.
-        blended = CaptureScreen(wxRect(GetPosition(), m_background.GetLogicalSize()));
-        if (!blended.IsOk() || !blended.GetData() || blended.GetSize() != picture.GetSize())
-            return;
         unsigned char* out = blended.GetData();
         const unsigned char* in = picture.GetData();
         const unsigned char* alpha = picture.GetAlpha();
@@ -220,8 +222,10 @@ void ZelSplashScreen::UpdateText()
     const int k = m_scale, stride = m_textBackground.GetWidth() * 3;
     const int w = std::min(m_textBackground.GetWidth(), m_textSize.x);
     const int h = m_textBackground.GetHeight(), total = m_textSize.y, s = m_scrollOffset * k;
-    wxImage window = m_textBackground.Copy();
-    unsigned char* out = window.GetData();
+    if (!m_textFrame.IsOk())
+        m_textFrame.Create(m_textBackground.GetSize(), false);
+    unsigned char* out = m_textFrame.GetData();
+    std::memcpy(out, m_textBackground.GetData(), std::size_t(stride) * std::size_t(h));
     const unsigned char colour[3] = {m_colour.Red(), m_colour.Green(), m_colour.Blue()};
     // The text's rows from `fromRow` over the window's rows from `atRow`, by their coverage.
     auto draw = [&](int fromRow, int rows, int atRow) {
@@ -229,10 +233,14 @@ void ZelSplashScreen::UpdateText()
             const unsigned char* alpha =
                 &m_textAlpha[std::size_t(fromRow + r) * std::size_t(m_textSize.x)];
             unsigned char* pixel = out + std::size_t(atRow + r) * std::size_t(stride);
-            for (int x = 0; x < w; ++x, ++alpha)
-                for (int c = 0; c < 3; ++c, ++pixel)
-                    *pixel = static_cast<unsigned char>(
-                        (*pixel * (255 - *alpha) + colour[c] * *alpha) / 255);
+            for (int x = 0; x < w; ++x, ++alpha, pixel += 3) {
+                // Most of the window lies between the glyphs.
+                if (*alpha == 0)
+                    continue;
+                for (int c = 0; c < 3; ++c)
+                    pixel[c] = static_cast<unsigned char>(
+                        (pixel[c] * (255 - *alpha) + colour[c] * *alpha) / 255);
+            }
         }
     };
     if (total <= h) {
@@ -245,7 +253,7 @@ void ZelSplashScreen::UpdateText()
         draw(s, total - s, 0);
         draw(0, h - (total - s), total - s);
     }
-    m_compositeDC.DrawBitmap(wxBitmap(window, wxBITMAP_SCREEN_DEPTH, k), m_textWindow.x,
+    m_compositeDC.DrawBitmap(wxBitmap(m_textFrame, wxBITMAP_SCREEN_DEPTH, k), m_textWindow.x,
                              m_textWindow.y, false);
     // The top-level window's own Refresh repaints the whole window whatever rectangle it
     // is given; the plain window's invalidates only the text window.

@@ -52,6 +52,7 @@ private:
     // The text window's part of the background, and the text's coverage, row by row, in
     // physical pixels.
     wxImage m_textBackground;
+    wxImage m_textFrame; // the text window being composed, made once
     std::vector<unsigned char> m_textAlpha;
     wxSize m_textSize;
     int m_scale = 1;

@@ -8,6 +8,7 @@
 #include "frame/Veltro3AppFrame.h"
 #include "help/CContextualHelp.h"
 #include "help/HelpTool.h"
+#include "platform/HeapTuning.h"
 #include "platform/InstanceLock.h"
 #include "resources/Catalogs.h"
 #include "settings/UpdateCheck.h"
@@ -61,6 +62,7 @@ bool Veltro3App::Initialize(int& argc, wxChar** argv)
 
 bool Veltro3App::OnInit()
 {
+    ReturnLargeBlocksToSystem();
     m_initialised = true;
     SetAppName("Veltrona");
     SetVendorName("Zelgrave");
