@@ -62,7 +62,6 @@ bool Veltro3App::Initialize(int& argc, wxChar** argv)
 
 bool Veltro3App::OnInit()
 {
-    ReturnLargeBlocksToSystem();
     m_initialised = true;
     SetAppName("Veltrona");
     SetVendorName("Zelgrave");
@@ -119,6 +118,8 @@ bool Veltro3App::OnInit()
     }
 
     ShowSplash(true, kSplashMilliseconds);
+    // After the splash's first paint: handing blocks back costs time.
+    ReturnLargeBlocksToSystem();
     m_splashTimer->Start(kSplashMilliseconds, wxTIMER_ONE_SHOT);
 
     m_frame = new Veltro3AppFrame(_("Veltrona"), wxDefaultPosition, wxDefaultSize);
