@@ -29,7 +29,7 @@ private:
         if (m_painted)
             return;
         m_painted = true;
-        std::printf("first_paint %lld\n", NowNs());
+        std::printf("first_paint %lld\nfirst_paint_cpu_us %lld\n", NowNs(), ThreadCpuUs());
         CallAfter([this] {
             std::printf("peak_rss_kb %ld\n", PeakRssKb());
             std::fflush(stdout);

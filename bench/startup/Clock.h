@@ -1,5 +1,5 @@
 // What both benchmark programs print: wall-clock times comparable with the shell's
-// `date +%s%N`, and the process's peak resident memory.
+// `date +%s%N`, the thread's CPU time, and the process's peak resident memory.
 #pragma once
 
 #include <cstdio>
@@ -12,6 +12,14 @@ inline long long NowNs()
     timespec t;
     clock_gettime(CLOCK_REALTIME, &t);
     return t.tv_sec * 1000000000LL + t.tv_nsec;
+}
+
+// CPU time of the calling thread: on a busy machine it varies far less than the wall clock.
+inline long long ThreadCpuUs()
+{
+    timespec t;
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &t);
+    return t.tv_sec * 1000000LL + t.tv_nsec / 1000;
 }
 
 inline long PeakRssKb()

@@ -34,7 +34,8 @@ public:
             auto* splash = static_cast<ZelSplashScreen*>(object);
             if (!m_splashPainted) {
                 m_splashPainted = true;
-                std::printf("splash_first_paint %lld\n", NowNs());
+                std::printf("splash_first_paint %lld\nsplash_first_paint_cpu_us %lld\n", NowNs(),
+                            ThreadCpuUs());
             } else if (m_measuring) {
                 ++m_paints;
                 const wxRect box = splash->GetUpdateRegion().GetBox();

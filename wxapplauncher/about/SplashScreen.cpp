@@ -13,6 +13,7 @@
 #include <wx/utils.h>
 
 #include <algorithm>
+#include <cstring>
 
 namespace {
 
@@ -97,6 +98,21 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     CentreOnPrimaryDisplay(this, size);
     ShapeToPicture(this, m_background);
 
+    const int perLine = startup ? kStartupPixelsPerLine : kAboutPixelsPerLine;
+    const int height = std::min(int(lines.size()), windowLineCount) * perLine;
+    const wxFont font = SplashTextFont(this);
+    m_scale = std::max(1, wxRound(scale));
+    {
+        // Of the text only its coverage is kept, a byte a pixel: its colour is one for all.
+        // Rendered before the blend, so that its buffers and the blend's never coexist.
+        const wxImage text = DrawTextLinesToImage(wxDefaultSize, wxDefaultPosition, font, lines,
+                                                  m_colour, 0, -1, scale);
+        if (text.IsOk() && text.HasAlpha()) {
+            m_textSize = text.GetSize();
+            m_textAlpha.assign(text.GetAlpha(),
+                               text.GetAlpha() + std::size_t(m_textSize.x) * m_textSize.y);
+        }
+    }
     // Without children the window itself must take the keyboard focus, or keys never reach it.
     SetCanFocus(true);
     SetFocus();
@@ -106,30 +122,26 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
         top->Update();
     BlendWithScreen();
 
-    const int perLine = startup ? kStartupPixelsPerLine : kAboutPixelsPerLine;
-    const int height = std::min(int(lines.size()), windowLineCount) * perLine;
-    const wxFont font = SplashTextFont(this);
-    m_text = DrawTextLinesToBitmap(wxDefaultSize, wxDefaultPosition, font, lines, m_colour, 0, -1,
-                                   scale);
     // Left to the theme, each device context made on the window, two per paint, would look
     // the window's font and colours up in it again.
     SetOwnFont(font);
     SetOwnForegroundColour(m_colour);
     SetOwnBackgroundColour(GetBackgroundColour());
-    if (m_background.IsOk())
-        m_composite = m_background.GetSubBitmap(wxRect(size));
-    if (m_composite.IsOk() && m_text.IsOk())
-        m_textWindow = PlaceTextWindow(size.x, m_text.GetLogicalSize(), textCentre, height, margin);
-    // Only the text window of the background is ever copied again; the rest of it would
-    // only double the composite.
-    m_background = m_textWindow.IsEmpty() ? wxBitmap() : m_background.GetSubBitmap(m_textWindow);
-    // Made once: each tick and each paint only copies between them.
+    if (m_background.IsOk() && !m_textAlpha.empty())
+        m_textWindow = PlaceTextWindow(size.x, m_textSize / m_scale, textCentre, height, margin);
+    // Only the text window of the background is ever copied again; the rest of the picture
+    // becomes the composite itself, not a copy of it.
+    if (!m_textWindow.IsEmpty()) {
+        m_textBackground = m_background.GetSubBitmap(m_textWindow).ConvertToImage();
+        // The text is laid on opaque pixels; only an unblended picture still has alpha.
+        if (m_textBackground.HasAlpha())
+            m_textBackground.ClearAlpha();
+    }
+    m_composite = m_background;
+    m_background = wxBitmap();
+    // Made once: each paint only copies from it.
     if (m_composite.IsOk())
         m_compositeDC.SelectObject(m_composite);
-    if (m_background.IsOk()) {
-        m_backgroundDC.SelectObjectAsSource(m_background);
-        m_textDC.SelectObjectAsSource(m_text);
-    }
 
     m_scrollOffset = 0;
     Show(true);
@@ -173,18 +185,18 @@ ZelSplashScreen::~ZelSplashScreen()
 
 void ZelSplashScreen::BlendWithScreen()
 {
-    if (!m_background.IsOk())
+    if (!m_background.IsOk() || !m_background.HasAlpha())
         return;
-    wxImage blended;
+    // Without a capture (no X11 desktop) the picture is shown unblended. Captured first:
+    // the server's reply is gone before the picture is converted.
+    wxImage blended = CaptureScreen(wxRect(GetPosition(), m_background.GetLogicalSize()));
+    if (!blended.IsOk() || !blended.GetData() || blended.GetSize() != m_background.GetSize())
+        return;
     {
         const wxImage picture = m_background.ConvertToImage();
         if (!picture.IsOk() || !picture.HasAlpha() || !picture.GetData())
             return;
         const int width = picture.GetWidth(), height = picture.GetHeight();
-        // Without a capture (no X11 desktop) the picture is shown unblended.
-        blended = CaptureScreen(wxRect(GetPosition(), m_background.GetLogicalSize()));
-        if (!blended.IsOk() || !blended.GetData() || blended.GetSize() != picture.GetSize())
-            return;
         unsigned char* out = blended.GetData();
         const unsigned char* in = picture.GetData();
         const unsigned char* alpha = picture.GetAlpha();
@@ -203,26 +215,46 @@ void ZelSplashScreen::BlendWithScreen()
 
 void ZelSplashScreen::UpdateText()
 {
-    if (!m_composite.IsOk() || !m_text.IsOk() || m_textWindow.IsEmpty())
+    if (!m_composite.IsOk() || m_textAlpha.empty() || !m_textBackground.IsOk() ||
+        m_textWindow.IsEmpty())
         return;
-    const int x = m_textWindow.x, y = m_textWindow.y, w = m_textWindow.width;
-    const int h = m_textWindow.height, total = m_text.GetLogicalSize().y, s = m_scrollOffset;
-    m_compositeDC.Blit(x, y, w, h, &m_backgroundDC, 0, 0, wxCOPY, false);
-    // A copy from a source with alpha is blended over what lies beneath it.
-    auto draw = [&](int fromRow, int rows, int atY) {
-        if (rows > 0)
-            m_compositeDC.Blit(x, atY, w, rows, &m_textDC, 0, fromRow, wxCOPY, true);
+    // Physical pixels: the text and the background have the display's own.
+    const int k = m_scale, stride = m_textBackground.GetWidth() * 3;
+    const int w = std::min(m_textBackground.GetWidth(), m_textSize.x);
+    const int h = m_textBackground.GetHeight(), total = m_textSize.y, s = m_scrollOffset * k;
+    if (!m_textFrame.IsOk())
+        m_textFrame.Create(m_textBackground.GetSize(), false);
+    unsigned char* out = m_textFrame.GetData();
+    std::memcpy(out, m_textBackground.GetData(), std::size_t(stride) * std::size_t(h));
+    const unsigned char colour[3] = {m_colour.Red(), m_colour.Green(), m_colour.Blue()};
+    // The text's rows from `fromRow` over the window's rows from `atRow`, by their coverage.
+    auto draw = [&](int fromRow, int rows, int atRow) {
+        for (int r = 0; r < rows; ++r) {
+            const unsigned char* alpha =
+                &m_textAlpha[std::size_t(fromRow + r) * std::size_t(m_textSize.x)];
+            unsigned char* pixel = out + std::size_t(atRow + r) * std::size_t(stride);
+            for (int x = 0; x < w; ++x, ++alpha, pixel += 3) {
+                // Most of the window lies between the glyphs.
+                if (*alpha == 0)
+                    continue;
+                for (int c = 0; c < 3; ++c)
+                    pixel[c] = static_cast<unsigned char>(
+                        (pixel[c] * (255 - *alpha) + colour[c] * *alpha) / 255);
+            }
+        }
     };
     if (total <= h) {
         // Text shorter than its window: shown once, never a second copy below it.
-        draw(s, total - s, y);
+        draw(s, total - s, 0);
     } else if (s + h <= total) {
-        draw(s, h - kPictureRows, y);
+        draw(s, h - kPictureRows * k, 0);
     } else {
         // Past the end the text continues with its first line, without a gap.
-        draw(s, total - s, y);
-        draw(0, h - (total - s), y + total - s);
+        draw(s, total - s, 0);
+        draw(0, h - (total - s), total - s);
     }
+    m_compositeDC.DrawBitmap(wxBitmap(m_textFrame, wxBITMAP_SCREEN_DEPTH, k), m_textWindow.x,
+                             m_textWindow.y, false);
     // The top-level window's own Refresh repaints the whole window whatever rectangle it
     // is given; the plain window's invalidates only the text window.
     wxWindow::Refresh(false, &m_textWindow);
@@ -237,7 +269,7 @@ void ZelSplashScreen::OnTimer(wxTimerEvent&)
     }
     if (m_timer.IsOneShot())
         m_timer.Start(kScrollPeriodMs, wxTIMER_CONTINUOUS);
-    if (++m_scrollOffset >= m_text.GetLogicalSize().y)
+    if (++m_scrollOffset >= m_textSize.y / m_scale)
         m_scrollOffset = 0;
     UpdateText();
 }

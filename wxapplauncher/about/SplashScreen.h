@@ -8,7 +8,10 @@
 #include <wx/colour.h>
 #include <wx/dcmemory.h>
 #include <wx/frame.h>
+#include <wx/image.h>
 #include <wx/timer.h>
+
+#include <vector>
 
 class ZelSplashScreen : public wxFrame
 {
@@ -46,7 +49,13 @@ private:
 
     wxBitmap m_composite;
     wxBitmap m_background;
-    wxBitmap m_text;
+    // The text window's part of the background, and the text's coverage, row by row, in
+    // physical pixels.
+    wxImage m_textBackground;
+    wxImage m_textFrame; // the text window being composed, made once
+    std::vector<unsigned char> m_textAlpha;
+    wxSize m_textSize;
+    int m_scale = 1;
     wxRect m_textWindow;
     wxTimer m_timer;
     bool m_startup = false;
@@ -55,8 +64,6 @@ private:
     bool m_painted = false;
     wxColour m_colour;
     wxMemoryDC m_compositeDC;
-    wxMemoryDC m_backgroundDC;
-    wxMemoryDC m_textDC;
 
     wxDECLARE_EVENT_TABLE();
 };

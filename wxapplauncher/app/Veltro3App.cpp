@@ -8,6 +8,7 @@
 #include "help/CContextualHelp.h"
 #include "help/HelpTool.h"
 #include "platform/DisplaySession.h"
+#include "platform/HeapTuning.h"
 #include "platform/InstanceLock.h"
 #include "platform/UserLanguage.h"
 #include "resources/Catalogs.h"
@@ -113,6 +114,8 @@ bool Veltro3App::OnInit()
     }
 
     ShowSplash(true, kSplashMilliseconds);
+    // After the splash's first paint: handing blocks back costs time.
+    ReturnLargeBlocksToSystem();
     m_splashTimer->Start(kSplashMilliseconds, wxTIMER_ONE_SHOT);
 
     m_frame = new Veltro3AppFrame(_("Veltrona"), wxDefaultPosition, wxDefaultSize);

@@ -93,9 +93,9 @@ wxFont FitFontToWidth(const wxFont& font, const wxArrayString& lines, int room)
     return fitted;
 }
 
-wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
-                               const wxArrayString& lines, const wxColour& colour, int alignment,
-                               int lineSpacing, double scale)
+wxImage DrawTextLinesToImage(const wxSize& size, const wxPoint& position, const wxFont& font,
+                             const wxArrayString& lines, const wxColour& colour, int alignment,
+                             int lineSpacing, double scale)
 {
     const double luminance = kGreen * colour.Green() + kRed * colour.Red() + kBlue * colour.Blue();
     const bool light = luminance >= 127.5;
@@ -118,10 +118,10 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
     const int width = size.GetWidth() == -1 ? m.widest : size.GetWidth();
     const int height = size.GetHeight() == -1 ? m.totalHeight : size.GetHeight();
     if (width <= 0 || height <= 0)
-        return wxBitmap();
+        return wxImage();
     wxBitmap bitmap = NewBitmap(wxSize(width, height), scale);
     if (!bitmap.IsOk())
-        return bitmap;
+        return wxImage();
 
     {
         wxMemoryDC dc(bitmap);
@@ -155,11 +155,10 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
     }
 
     wxImage image = bitmap.ConvertToImage();
-    // Released before the image turns back into a bitmap: a long text would otherwise be
-    // held three times over at once.
+    // Released at once: a long text would otherwise be held three times over.
     bitmap = wxBitmap();
     if (!image.IsOk())
-        return wxBitmap();
+        return wxImage();
     if (!image.HasAlpha())
         image.InitAlpha();
     unsigned char* rgb = image.GetData();
@@ -172,7 +171,16 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
         rgb[1] = colour.Green();
         rgb[2] = colour.Blue();
     }
-    return wxBitmap(image, wxBITMAP_SCREEN_DEPTH, scale);
+    return image;
+}
+
+wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
+                               const wxArrayString& lines, const wxColour& colour, int alignment,
+                               int lineSpacing, double scale)
+{
+    const wxImage image =
+        DrawTextLinesToImage(size, position, font, lines, colour, alignment, lineSpacing, scale);
+    return image.IsOk() ? wxBitmap(image, wxBITMAP_SCREEN_DEPTH, scale) : wxBitmap();
 }
 
 wxBitmap DrawTextToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,

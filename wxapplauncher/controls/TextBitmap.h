@@ -8,6 +8,7 @@
 #include <wx/colour.h>
 #include <wx/font.h>
 #include <wx/gdicmn.h>
+#include <wx/image.h>
 #include <wx/string.h>
 
 // Lines of text in `colour`, alpha from coverage. A size component of -1 fits
@@ -19,6 +20,11 @@
 wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
                                const wxArrayString& lines, const wxColour& colour, int alignment,
                                int lineSpacing, double scale = 1.0);
+
+// The same as an image of the physical pixels, for callers that blend it themselves.
+wxImage DrawTextLinesToImage(const wxSize& size, const wxPoint& position, const wxFont& font,
+                             const wxArrayString& lines, const wxColour& colour, int alignment,
+                             int lineSpacing, double scale = 1.0);
 
 // The same for one text whose lines are separated by line feeds; a trailing
 // line feed adds no empty line.

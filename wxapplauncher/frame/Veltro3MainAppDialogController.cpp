@@ -55,6 +55,10 @@ Veltro3MainAppDialogController::Veltro3MainAppDialogController(wxWindow* parent,
 {
     ResetViewColour();
     m_background = LoadPicture("Veltro2AppFrame::LauncherBG", GetContentScaleFactor());
+    // Drawn, the picture would keep its decoded pixels twice: as loaded and as the
+    // toolkit's drawing surface. Selected once, only the surface stays.
+    if (IsUsablePicture(m_background))
+        wxMemoryDC(m_background).SelectObject(wxNullBitmap);
     m_titleFont = TitleFont();
     SetInitialSize(size);
 }

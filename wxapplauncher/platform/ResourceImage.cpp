@@ -108,7 +108,15 @@ bool MemoryByteSource::Read(std::uint64_t offset, void* out, std::size_t count) 
     return true;
 }
 
-ResourceImage::ResourceImage(std::vector<unsigned char> bytes) : m_bytes(std::move(bytes))
+ResourceImage::ResourceImage(std::vector<unsigned char> bytes)
+    : m_bytes(std::move(bytes)), m_data(m_bytes.data()), m_size(m_bytes.size())
+{
+    Parse();
+}
+
+ResourceImage::ResourceImage(std::shared_ptr<const void> keeper, const unsigned char* data,
+                             std::size_t size)
+    : m_keeper(std::move(keeper)), m_data(data), m_size(size)
 {
     Parse();
 }
@@ -120,8 +128,8 @@ ResourceImage::ResourceImage(std::vector<ResourceEntry> entries) : m_entries(std
 // language, version and characteristics; the data follows, padded to 4.
 void ResourceImage::Parse()
 {
-    const unsigned char* base = m_bytes.data();
-    const std::size_t size = m_bytes.size();
+    const unsigned char* base = m_data;
+    const std::size_t size = m_size;
     std::size_t pos = 0;
     while (size - pos >= 8) {
         const std::uint32_t dataSize = Le32(base + pos);

@@ -7,6 +7,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <fstream>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -81,6 +82,8 @@ public:
     // Entries whose data the system keeps for the whole run, such as a loaded
     // module's own resources.
     explicit ResourceImage(std::vector<ResourceEntry> entries);
+    // A .res image over bytes that `keeper` holds in place, such as a mapped section.
+    ResourceImage(std::shared_ptr<const void> keeper, const unsigned char* data, std::size_t size);
     ResourceImage(const ResourceImage&) = delete;
     ResourceImage& operator=(const ResourceImage&) = delete;
     // Moving keeps the byte buffer, so entries stay valid.
@@ -102,5 +105,8 @@ private:
     void Parse();
 
     std::vector<unsigned char> m_bytes;
+    std::shared_ptr<const void> m_keeper;
+    const unsigned char* m_data = nullptr;
+    std::size_t m_size = 0;
     std::vector<ResourceEntry> m_entries;
 };

@@ -8,8 +8,12 @@
 #include <limits>
 #include <utility>
 
-bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
-                    std::vector<unsigned char>& contents)
+#include <fcntl.h>
+#include <sys/mman.h>
+#include <unistd.h>
+
+bool FindElfSection(const ByteSource& source, const std::string& sectionName, std::uint64_t& offset,
+                    std::uint64_t& size)
 {
     unsigned char ident[64];
     static const unsigned char magic[4] = {0x7F, 'E', 'L', 'F'};
@@ -67,10 +71,21 @@ bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
         if (s.type == noBits || s.offset > source.Size() || s.size > source.Size() - s.offset ||
             s.size > std::numeric_limits<std::size_t>::max())
             return false;
-        contents.resize(std::size_t(s.size));
-        return source.Read(s.offset, contents.data(), contents.size());
+        offset = s.offset;
+        size = s.size;
+        return true;
     }
     return false;
+}
+
+bool ReadElfSection(const ByteSource& source, const std::string& sectionName,
+                    std::vector<unsigned char>& contents)
+{
+    std::uint64_t offset = 0, size = 0;
+    if (!FindElfSection(source, sectionName, offset, size))
+        return false;
+    contents.resize(std::size_t(size));
+    return source.Read(offset, contents.data(), contents.size());
 }
 
 bool ReadElfSectionOfFile(const std::string& path, const std::string& sectionName,
@@ -79,14 +94,33 @@ bool ReadElfSectionOfFile(const std::string& path, const std::string& sectionNam
     return ReadElfSection(FileByteSource(path), sectionName, contents);
 }
 
+ResourceImage MapElfResources(const std::string& path)
+{
+    std::uint64_t offset = 0, size = 0;
+    if (!FindElfSection(FileByteSource(path), ".rsrc", offset, size) || size == 0)
+        return ResourceImage();
+    // Mapped rather than read: only the pages of the resources in use are ever loaded,
+    // and none of them is held twice.
+    const int fd = open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    if (fd < 0)
+        return ResourceImage();
+    const std::uint64_t page = std::uint64_t(sysconf(_SC_PAGESIZE));
+    const std::uint64_t start = offset / page * page;
+    const std::size_t length = std::size_t(size + (offset - start));
+    void* mapped = mmap(nullptr, length, PROT_READ, MAP_PRIVATE, fd, off_t(start));
+    close(fd);
+    if (mapped == MAP_FAILED)
+        return ResourceImage();
+    std::shared_ptr<const void> keeper(
+        mapped, [length](const void* region) { munmap(const_cast<void*>(region), length); });
+    return ResourceImage(std::move(keeper),
+                         static_cast<const unsigned char*>(mapped) + (offset - start),
+                         std::size_t(size));
+}
+
 const ResourceImage& ResourceImage::OfExecutable()
 {
-    static const ResourceImage image = [] {
-        std::vector<unsigned char> bytes;
-        if (!ReadElfSectionOfFile("/proc/self/exe", ".rsrc", bytes))
-            return ResourceImage();
-        return ResourceImage(std::move(bytes));
-    }();
+    static const ResourceImage image = MapElfResources("/proc/self/exe");
     return image;
 }
 
