@@ -22,6 +22,12 @@ inline WindowIdentity IdentityFor(const std::string& baseName)
     return {"VeltronaStandin", baseName};
 }
 
+// The window's text layout, in pixels: one line for the program, one per argument.
+constexpr int kMargin = 12;
+constexpr int kLineHeight = 16;
+constexpr int kWidth = 480;
+constexpr int kMaxLines = 40;
+
 // Shows the window and runs until it is closed. readyFile (UTF-8), when not
 // empty, receives the window's id in decimal (the X window id, or the HWND)
 // once the window is shown. Returns the exit status: 0 when closed, 1 when no

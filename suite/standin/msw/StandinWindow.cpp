@@ -9,11 +9,6 @@ namespace standin {
 
 namespace {
 
-constexpr int kMargin = 12;
-constexpr int kLineHeight = 16;
-constexpr int kWidth = 480;
-constexpr int kMaxLines = 40;
-
 using Lines = std::vector<std::wstring>;
 
 LRESULT CALLBACK WindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam)

@@ -11,11 +11,6 @@ namespace standin {
 
 namespace {
 
-constexpr int kMargin = 12;
-constexpr int kLineHeight = 16;
-constexpr int kWidth = 480;
-constexpr int kMaxLines = 40;
-
 void SetTitle(Display* display, Window window, const WindowIdentity& identity,
               const std::string& baseName)
 {
