@@ -1,5 +1,6 @@
 // The real launcher with Varo.dll beside it, reached by ordinal: File > "Create Monitor
 // Profile..." is refused with a message while the simulated instrument is on its table.
+// The library it is given answers by those ordinals alone, as the vendor's does.
 #include "support/GuiWait.h"
 #include "support/ProbeRun.h"
 #include "support/StandinDir.h"
@@ -7,6 +8,10 @@
 
 #include <gtest/gtest.h>
 #include <wx/filefn.h>
+
+#include <windows.h>
+
+#include <set>
 
 namespace {
 
@@ -38,6 +43,23 @@ TEST(MonitorTableTest, MonitorIsRefusedOnlyWhileTheInstrumentIsOnTheTable)
                                             "Connect directly to the Zel Varo and try again.");
         }
     }
+}
+
+TEST(MonitorTableTest, TheLibraryExportsItsSixFunctionsByOrdinalOnly)
+{
+    // Not run: only its export table is read.
+    const HMODULE library =
+        LoadLibraryExA(VELTRONA_VARO_PATH, nullptr, DONT_RESOLVE_DLL_REFERENCES);
+    ASSERT_NE(library, nullptr) << VELTRONA_VARO_PATH;
+    const std::set<int> ordinals = {5, 11, 12, 14, 18, 23};
+    for (int ordinal = 1; ordinal < 1024; ++ordinal)
+        EXPECT_EQ(GetProcAddress(library, MAKEINTRESOURCEA(ordinal)) != nullptr,
+                  ordinals.count(ordinal) == 1)
+            << "ordinal " << ordinal;
+    for (const char* name :
+         {"VaroMeasure", "VaroCheckTableMount", "varosim_set_state", "varosim_fire"})
+        EXPECT_EQ(GetProcAddress(library, name), nullptr) << name;
+    FreeLibrary(library);
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "about/PictureWindow.h"
 #include "controls/TextBitmap.h"
+#include "platform/DisplayScale.h"
 #include "resources/ImageSets.h"
 
 #include <wx/dcclient.h>
@@ -42,7 +43,7 @@ ZelModuleSplashScreen::ZelModuleSplashScreen(int id, const wxArrayString& lines)
     wxDialog::Create(nullptr, id, wxString(), wxDefaultPosition, wxDefaultSize,
                      wxNO_BORDER | wxSTAY_ON_TOP | wxFRAME_SHAPED | wxFRAME_NO_TASKBAR);
     m_lines = lines;
-    m_picture = LoadCommonBitmap("Helper::ModuleSplash", GetContentScaleFactor());
+    m_picture = LoadCommonBitmap("Helper::ModuleSplash", PictureScale(*this));
     wxSafeYield(nullptr, false);
 
     const wxSize size = m_picture.IsOk() ? m_picture.GetLogicalSize() : wxSize(0, 0);

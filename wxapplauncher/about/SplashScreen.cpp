@@ -3,6 +3,7 @@
 #include "about/PictureWindow.h"
 #include "controls/TextBitmap.h"
 
+#include "platform/DisplayScale.h"
 #include "platform/ScreenCapture.h"
 
 #include <wx/app.h>
@@ -91,7 +92,8 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     m_colour = colour;
     wxSafeYield(nullptr, false);
 
-    // Logical pixels; the picture may have more physical ones on a scaled display.
+    // The window's own units; the picture may have more physical ones on a scaled display.
+    // The text's place and lines are given in device-independent pixels.
     const wxSize size = picture.IsOk() ? picture.GetLogicalSize() : wxSize(0, 0);
     const double scale = picture.IsOk() ? picture.GetScaleFactor() : 1.0;
     SetSize(size);
@@ -128,7 +130,8 @@ void ZelSplashScreen::Start(int id, bool startup, int milliseconds, const wxBitm
     SetOwnForegroundColour(m_colour);
     SetOwnBackgroundColour(GetBackgroundColour());
     if (m_background.IsOk() && !m_textAlpha.empty())
-        m_textWindow = PlaceTextWindow(size.x, m_textSize / m_scale, textCentre, height, margin);
+        m_textWindow = PlaceTextWindow(size.x, FromDIP(m_textSize / m_scale), FromDIP(textCentre),
+                                       FromDIP(height), FromDIP(margin));
     // Only the text window of the background is ever copied again; the rest of the picture
     // becomes the composite itself, not a copy of it.
     if (!m_textWindow.IsEmpty()) {
@@ -210,7 +213,7 @@ void ZelSplashScreen::BlendWithScreen()
     // to the window's peak memory.
     const double scale = m_background.GetScaleFactor();
     m_background = wxBitmap();
-    m_background = wxBitmap(blended, wxBITMAP_SCREEN_DEPTH, scale);
+    m_background = ScaledBitmap(blended, scale);
 }
 
 void ZelSplashScreen::UpdateText()
@@ -253,8 +256,7 @@ void ZelSplashScreen::UpdateText()
         draw(s, total - s, 0);
         draw(0, h - (total - s), total - s);
     }
-    m_compositeDC.DrawBitmap(wxBitmap(m_textFrame, wxBITMAP_SCREEN_DEPTH, k), m_textWindow.x,
-                             m_textWindow.y, false);
+    m_compositeDC.DrawBitmap(ScaledBitmap(m_textFrame, k), m_textWindow.x, m_textWindow.y, false);
     // The top-level window's own Refresh repaints the whole window whatever rectangle it
     // is given; the plain window's invalidates only the text window.
     wxWindow::Refresh(false, &m_textWindow);

@@ -1,9 +1,12 @@
 #include "controls/TextBitmap.h"
 
+#include "platform/DisplayScale.h"
+
 #include <wx/dcmemory.h>
 #include <wx/image.h>
 
 #include <algorithm>
+#include <cmath>
 
 namespace {
 
@@ -75,28 +78,42 @@ Measured Fit(wxDC& dc, wxFont& font, const wxArrayString& lines, int lineSpacing
     }
 }
 
-wxBitmap NewBitmap(const wxSize& size, double scale)
+// A bitmap of `scale` whose memory DC has `units` (drawing units) of room.
+wxBitmap NewBitmap(const wxSize& units, double scale)
 {
+    const double perDip = DrawingUnitsPerDip(scale);
     wxBitmap bitmap;
-    bitmap.CreateWithDIPSize(size, scale);
+    bitmap.CreateWithDIPSize(wxSize(static_cast<int>(std::ceil(units.x / perDip)),
+                                    static_cast<int>(std::ceil(units.y / perDip))),
+                             scale);
     return bitmap;
+}
+
+int ToUnits(int dips, double perDip)
+{
+    return dips == -1 ? -1 : wxRound(dips * perDip);
 }
 
 } // namespace
 
-wxFont FitFontToWidth(const wxFont& font, const wxArrayString& lines, int room)
+wxFont FitFontToWidth(const wxFont& font, const wxArrayString& lines, int room, double scale)
 {
     wxFont fitted(font);
     wxBitmap scratch(1, 1);
     wxMemoryDC dc(scratch);
-    Fit(dc, fitted, lines, 0, room);
+    Fit(dc, fitted, lines, 0, ToUnits(room, DrawingUnitsPerDip(scale)));
     return fitted;
 }
 
-wxImage DrawTextLinesToImage(const wxSize& size, const wxPoint& position, const wxFont& font,
+wxImage DrawTextLinesToImage(const wxSize& dipSize, const wxPoint& dipPosition, const wxFont& font,
                              const wxArrayString& lines, const wxColour& colour, int alignment,
-                             int lineSpacing, double scale)
+                             int dipLineSpacing, double scale)
 {
+    // Measured and drawn in the memory DC's own units.
+    const double perDip = DrawingUnitsPerDip(scale);
+    const wxSize size(ToUnits(dipSize.x, perDip), ToUnits(dipSize.y, perDip));
+    const wxPoint position(ToUnits(dipPosition.x, perDip), ToUnits(dipPosition.y, perDip));
+    const int lineSpacing = ToUnits(dipLineSpacing, perDip);
     const double luminance = kGreen * colour.Green() + kRed * colour.Red() + kBlue * colour.Blue();
     const bool light = luminance >= 127.5;
     const wxColour textColour = light ? *wxWHITE : *wxBLACK;
@@ -180,7 +197,7 @@ wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, cons
 {
     const wxImage image =
         DrawTextLinesToImage(size, position, font, lines, colour, alignment, lineSpacing, scale);
-    return image.IsOk() ? wxBitmap(image, wxBITMAP_SCREEN_DEPTH, scale) : wxBitmap();
+    return image.IsOk() ? ScaledBitmap(image, scale) : wxBitmap();
 }
 
 wxBitmap DrawTextToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
@@ -249,7 +266,7 @@ wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay, const wx
             result.GetAlpha()[b] = static_cast<unsigned char>(a * 255.0f + 0.5f);
         }
     }
-    return wxBitmap(result, wxBITMAP_SCREEN_DEPTH, scale);
+    return ScaledBitmap(result, scale);
 }
 
 wxFont GetUIFont(int pointSize, int weight)

@@ -15,8 +15,8 @@
 // that dimension to the text; a position component of -1 takes the anchor
 // from `alignment`. With a width given, the font shrinks (down to 7 points)
 // until the widest line fits the room right of the anchor. Invalid when the
-// size comes out empty. Sizes and positions are logical pixels; the bitmap
-// has `scale` times as many physical ones, with that scale factor.
+// size comes out empty. Sizes and positions are device-independent pixels; the
+// bitmap has `scale` times as many physical ones, with that scale factor.
 wxBitmap DrawTextLinesToBitmap(const wxSize& size, const wxPoint& position, const wxFont& font,
                                const wxArrayString& lines, const wxColour& colour, int alignment,
                                int lineSpacing, double scale = 1.0);
@@ -33,12 +33,13 @@ wxBitmap DrawTextToBitmap(const wxSize& size, const wxPoint& position, const wxF
                           int lineSpacing, double scale = 1.0);
 
 // The font at the largest size, from its own down to 7 points, at which every
-// line is at most `room` - 2 pixels wide.
-wxFont FitFontToWidth(const wxFont& font, const wxArrayString& lines, int room);
+// line is at most `room` - 2 device-independent pixels wide, for text rendered at
+// `scale`.
+wxFont FitFontToWidth(const wxFont& font, const wxArrayString& lines, int room, double scale = 1.0);
 
 // A copy of `base` with `overlay` laid over it at `position` (wxDefaultPosition
 // is the top-left corner), "over" operator on unpremultiplied colour. Invalid
-// when either input is invalid. The position is in the base's logical pixels;
+// when either input is invalid. The position is in the base's device-independent pixels;
 // an overlay of another scale factor is resampled to the base's.
 wxBitmap CompositeBitmap(const wxBitmap& base, const wxBitmap& overlay,
                          const wxPoint& position = wxDefaultPosition);

@@ -1,6 +1,7 @@
 #include "controls/ZelStaticBitmap.h"
 
 #include "platform/ButtonAccessibility.h"
+#include "platform/DisplayScale.h"
 #include "platform/KeyboardFocus.h"
 
 #include <wx/dcclient.h>
@@ -213,7 +214,7 @@ wxSize ZelStaticBitmap::DoGetBestSize() const
         if (b->IsOk())
             best.IncTo(b->GetLogicalSize());
     if (m_framed)
-        best += wxSize(4, 6);
+        best += FromDIP(wxSize(4, 6));
     return best;
 }
 
@@ -294,11 +295,12 @@ void ZelStaticBitmap::OnPaint(wxPaintEvent&)
     if (size.x <= 0 || size.y <= 0)
         return;
     // Of the display's physical pixels, so that a scaled display shows the images' own.
-    const double scale = GetContentScaleFactor();
-    if (!m_backBuffer || !m_backBuffer->IsOk() || m_backBuffer->GetLogicalSize() != size ||
+    const double scale = PictureScale(*this);
+    const wxSize dipSize = ToDIP(size);
+    if (!m_backBuffer || !m_backBuffer->IsOk() || m_backBuffer->GetDIPSize() != dipSize ||
         m_backBuffer->GetScaleFactor() != scale) {
         m_backBuffer = std::make_unique<wxBitmap>();
-        m_backBuffer->CreateWithDIPSize(size, scale);
+        m_backBuffer->CreateWithDIPSize(dipSize, scale);
         m_dirty = true;
     }
     if (m_dirty) {
@@ -373,7 +375,7 @@ void ZelStaticBitmap::Render(wxDC& dc, int w, int h)
         if (m_centred)
             dc.DrawBitmap(*image, (w - imageSize.x) / 2, (h - imageSize.y) / 2, true);
         else
-            dc.DrawBitmap(*image, 2, 3, true);
+            dc.DrawBitmap(*image, FromDIP(2), FromDIP(3), true);
     }
 
     if (frame)
@@ -515,5 +517,5 @@ wxBitmap MakeDisabledBitmap(const wxBitmap& bitmap, const wxColour& colour, doub
         std::copy(source.GetAlpha(), source.GetAlpha() + static_cast<long>(w) * h,
                   result.GetAlpha());
     }
-    return wxBitmap(result, wxBITMAP_SCREEN_DEPTH, bitmap.GetScaleFactor());
+    return ScaledBitmap(result, bitmap.GetScaleFactor());
 }

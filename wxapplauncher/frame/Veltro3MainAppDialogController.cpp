@@ -1,6 +1,7 @@
 #include "frame/Veltro3MainAppDialogController.h"
 
 #include "controls/TextBitmap.h"
+#include "platform/DisplayScale.h"
 #include "platform/KeyboardFocus.h"
 #include "resources/ImageSets.h"
 
@@ -19,13 +20,13 @@ const int kEvaluateColumnRight = 557;
 
 // One size for both titles, the largest at which each fits its column: large
 // desktop text would otherwise run "Evaluate Profile" into the window's edge.
-wxFont TitleFont()
+wxFont TitleFont(double scale)
 {
     const wxFont font = GetUIFont(8, wxBOLD);
-    auto fit = [&font](const wxString& title, int room) {
+    auto fit = [&font, scale](const wxString& title, int room) {
         wxArrayString lines;
         lines.Add(title);
-        return FitFontToWidth(font, lines, room);
+        return FitFontToWidth(font, lines, room, scale);
     };
     const wxFont create = fit(_("Create Profile"), kCreateColumnRight - kCreateTitle.x);
     const wxFont evaluate = fit(_("Evaluate Profile"), kEvaluateColumnRight - kEvaluateTitle.x);
@@ -54,12 +55,13 @@ Veltro3MainAppDialogController::Veltro3MainAppDialogController(wxWindow* parent,
     : wxPanel(parent, id, pos, size, style, name)
 {
     ResetViewColour();
-    m_background = LoadPicture("Veltro2AppFrame::LauncherBG", GetContentScaleFactor());
+    const double scale = PictureScale(*this);
+    m_background = LoadPicture("Veltro2AppFrame::LauncherBG", scale);
     // Drawn, the picture would keep its decoded pixels twice: as loaded and as the
     // toolkit's drawing surface. Selected once, only the surface stays.
     if (IsUsablePicture(m_background))
         wxMemoryDC(m_background).SelectObject(wxNullBitmap);
-    m_titleFont = TitleFont();
+    m_titleFont = TitleFont(scale);
     SetInitialSize(size);
 }
 
@@ -89,7 +91,7 @@ void Veltro3MainAppDialogController::OnWindowCreate(wxWindowCreateEvent& event)
 
 wxSize Veltro3MainAppDialogController::DoGetBestSize() const
 {
-    return kViewSize;
+    return FromDIP(kViewSize);
 }
 
 void Veltro3MainAppDialogController::OnPaint(wxPaintEvent&)
@@ -100,11 +102,12 @@ void Veltro3MainAppDialogController::OnPaint(wxPaintEvent&)
         return;
     // Of the display's physical pixels: a scaled display shows the pictures' own pixels
     // and text drawn at its resolution.
-    const double scale = GetContentScaleFactor();
-    if (!m_backBuffer.IsOk() || m_backBuffer.GetLogicalSize() != size ||
+    const double scale = PictureScale(*this);
+    const wxSize dipSize = ToDIP(size);
+    if (!m_backBuffer.IsOk() || m_backBuffer.GetDIPSize() != dipSize ||
         m_backBuffer.GetScaleFactor() != scale) {
         m_backBuffer = wxBitmap();
-        m_backBuffer.CreateWithDIPSize(size, scale);
+        m_backBuffer.CreateWithDIPSize(dipSize, scale);
         m_dirty = true;
     }
     if (!m_backBuffer.IsOk())
@@ -128,15 +131,17 @@ void Veltro3MainAppDialogController::DrawBackground(wxDC& dc)
 
     dc.SetFont(m_titleFont);
     dc.SetTextForeground(DarkOnPicture(dc.GetTextForeground()));
-    dc.DrawText(_("Create Profile"), kCreateTitle);
-    dc.DrawText(_("Evaluate Profile"), kEvaluateTitle);
+    dc.DrawText(_("Create Profile"), FromDIP(kCreateTitle));
+    dc.DrawText(_("Evaluate Profile"), FromDIP(kEvaluateTitle));
 
     // A sunken rule under the menu bar.
     const int width = GetClientSize().x;
-    dc.SetPen(wxPen(wxSystemSettings::GetColour(wxSYS_COLOUR_BTNSHADOW), 1, wxPENSTYLE_SOLID));
+    const int line = FromDIP(1);
+    dc.SetPen(wxPen(wxSystemSettings::GetColour(wxSYS_COLOUR_BTNSHADOW), line, wxPENSTYLE_SOLID));
     dc.DrawLine(0, 0, width, 0);
-    dc.SetPen(wxPen(wxSystemSettings::GetColour(wxSYS_COLOUR_BTNHIGHLIGHT), 1, wxPENSTYLE_SOLID));
-    dc.DrawLine(0, 1, width, 1);
+    dc.SetPen(
+        wxPen(wxSystemSettings::GetColour(wxSYS_COLOUR_BTNHIGHLIGHT), line, wxPENSTYLE_SOLID));
+    dc.DrawLine(0, line, width, line);
 }
 
 void Veltro3MainAppDialogController::OnEraseBackground(wxEraseEvent&) {}

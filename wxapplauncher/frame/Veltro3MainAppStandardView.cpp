@@ -5,6 +5,7 @@
 #include "frame/DragNDrop.h"
 #include "frame/Ids.h"
 #include "frame/ModuleCatalog.h"
+#include "platform/DisplayScale.h"
 #include "resources/ImageSets.h"
 
 #include <wx/app.h>
@@ -57,14 +58,14 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
                                                        long style, const wxString& name)
     : Veltro3MainAppDialogController(parent, id, pos, size, style, name)
 {
-    const double scale = GetContentScaleFactor();
+    const double scale = PictureScale(*this);
     auto Picture = [scale](const wxString& name) {
         return LoadPicture("Veltro2AppFrame::" + name, scale);
     };
     const wxCursor hand(wxCURSOR_HAND);
     const wxBitmap highlight = Picture("HighlightBackground");
     const wxBitmap highlightPressed = Picture("HighlightPressed");
-    const wxSize canvasSize = IsUsablePicture(highlight) ? highlight.GetLogicalSize() : kButtonSize;
+    const wxSize canvasSize = IsUsablePicture(highlight) ? highlight.GetDIPSize() : kButtonSize;
     const wxBitmap blank = DrawTextToBitmap(canvasSize, wxDefaultPosition, GetFont(), wxString(),
                                             *wxBLACK, 0, 0, scale);
     const int middle = (369 - canvasSize.y) / 2;
@@ -75,7 +76,7 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
     wxArrayString labels;
     for (const ButtonPlace& place : kPlaces)
         labels.Add(wxGetTranslation(FindModule(place.moduleId)->buttonLabel));
-    m_labelFont = FitFontToWidth(GetFont(), labels, canvasSize.x - kIconWidth - kLabelGap);
+    m_labelFont = FitFontToWidth(GetFont(), labels, canvasSize.x - kIconWidth - kLabelGap, scale);
 
     for (int i = 0; i < MODULE_COUNT; ++i) {
         const ButtonPlace& place = kPlaces[i];
@@ -90,8 +91,8 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
                                Picture(icon + "Selected"), label, wxPoint(-1, 0));
 
         m_buttons[i] = new ZelStaticBitmap(this, module->buttonId, m_images[i].normal,
-                                           wxPoint(place.left, rowTops[place.row]), wxDefaultSize,
-                                           wxNO_BORDER, "zelStaticBitmap");
+                                           FromDIP(wxPoint(place.left, rowTops[place.row])),
+                                           wxDefaultSize, wxNO_BORDER, "zelStaticBitmap");
         m_buttons[i]->SetLabel(label);
         m_buttons[i]->SetCursor(hand);
         if (i == MONITOR || i == VERIFY || i == EDIT)
@@ -101,9 +102,9 @@ Veltro3MainAppStandardView::Veltro3MainAppStandardView(wxWindow* parent, wxWindo
             m_buttons[i]->SetDropTarget(new DragNDrop(this, ID_MODULE_INSPECT));
     }
 
-    m_helpButton =
-        new ZelStaticBitmap(this, ID_BUTTON_HELP, Picture("Help"), wxPoint(10, GetSize().y - 40),
-                            wxDefaultSize, ZSB_FRAMED, "zelStaticBitmap");
+    m_helpButton = new ZelStaticBitmap(this, ID_BUTTON_HELP, Picture("Help"),
+                                       wxPoint(FromDIP(10), GetSize().y - FromDIP(40)),
+                                       wxDefaultSize, ZSB_FRAMED, "zelStaticBitmap");
     m_helpButton->SetBackgroundColour(kHelpButtonColour);
     m_helpButton->SetLabel(wxStripMenuCodes(_("&Help")));
 
@@ -126,8 +127,8 @@ wxBitmap Veltro3MainAppStandardView::ComposeButtonImage(const wxBitmap& canvas,
 {
     if (!IsUsablePicture(canvas))
         return canvas;
-    const int iconWidth = IsUsablePicture(icon) ? icon.GetLogicalSize().x : 0;
-    const wxSize size = canvas.GetLogicalSize();
+    const int iconWidth = IsUsablePicture(icon) ? icon.GetDIPSize().x : 0;
+    const wxSize size = canvas.GetDIPSize();
     // The pictures are light: a dark theme's light text colour would vanish.
     const wxBitmap text = DrawTextToBitmap(
         size, wxPoint(offset.x + iconWidth + kLabelGap, size.y / 2 + offset.y),

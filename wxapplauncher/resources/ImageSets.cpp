@@ -1,5 +1,6 @@
 #include "resources/ImageSets.h"
 
+#include "platform/DisplayScale.h"
 #include "resources/EmbeddedFiles.h"
 
 #include <wx/filesys.h>
@@ -63,7 +64,7 @@ wxBitmap LoadDoubledRendering(const wxString& name)
                 continue;
             wxMemoryInputStream stream(set.scaled[i].data, set.scaled[i].size);
             const wxImage image(stream, wxBITMAP_TYPE_PNG);
-            return image.IsOk() ? wxBitmap(image, -1, 2.0) : wxBitmap();
+            return image.IsOk() ? ScaledBitmap(image, 2.0) : wxBitmap();
         }
     }
     return wxBitmap();
