@@ -4,6 +4,7 @@
 # same path below the suite's folder, and the settings file that the build writes.
 # As a script: cmake -DPACKAGE=... -DSTAGED=... -DVERSION=... -DOUTPUT=... -DSETTINGS=...
 #              -P BuildMsi.cmake
+cmake_policy(VERSION 3.18)
 
 # The packages' file names.
 set(veltrona_msi_launcher Veltrona)
@@ -116,10 +117,11 @@ ${refs}    </ComponentGroup>
                                 "DELETE FROM `MsiFileHash` WHERE `File_` = '${id}'")
         endif()
     endforeach()
-    # wixl writes no component conditions: the desktop shortcut is there when asked for.
+    # wixl writes no component conditions: the desktop shortcut is there when asked for,
+    # and the removal takes it away whatever the command line says (a component whose
+    # condition is false keeps its state).
     if(package STREQUAL "launcher")
-        list(APPEND queries
-             "UPDATE `Component` SET `Condition` = 'DESKTOPSHORTCUT=1' WHERE `Component` = 'DesktopShortcut'")
+        list(APPEND queries "UPDATE `Component` SET `Condition` = 'DESKTOPSHORTCUT=1 OR REMOVE~=\"ALL\"' WHERE `Component` = 'DesktopShortcut'")
     endif()
     foreach(query ${queries})
         execute_process(COMMAND "${msibuild}" "${output}" -q "${query}" RESULT_VARIABLE failed)
