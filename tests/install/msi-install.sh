@@ -39,7 +39,8 @@ installed='C:\Program Files\Zelgrave\Veltrona'
 folder="$WINEPREFIX/drive_c/Program Files/Zelgrave/Veltrona"
 
 msiexec() {
-    wine msiexec "$@" /qn </dev/null || fail "msiexec $* ended with $?"
+    timeout 300 wine msiexec "$@" /qn </dev/null ||
+        fail "msiexec $* ended with $? (124: still running after 300 s)"
 }
 # A registry value's data ("" for the default value), or failure when there is none.
 value() {

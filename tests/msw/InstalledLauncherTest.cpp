@@ -12,6 +12,7 @@
 #include <wx/dir.h>
 #include <wx/filefn.h>
 #include <wx/filename.h>
+#include <wx/process.h>
 #include <wx/stdpaths.h>
 #include <wx/utils.h>
 
@@ -136,7 +137,10 @@ TEST_F(InstalledLauncherTest, ProfileOpenedWithVeltronaReachesInspectWhole)
 
     for (const size_t started : {1u, 2u}) {
         SCOPED_TRACE(started == 1 ? "launcher started with the file" : "handed to the running one");
-        EXPECT_EQ(wxExecute(open, wxEXEC_SYNC), 0);
+        const long starter = wxExecute(open, wxEXEC_ASYNC);
+        ASSERT_GT(starter, 0);
+        ASSERT_TRUE(WaitFor([&] { return !wxProcess::Exists(int(starter)); }, 30000))
+            << "start.exe's end";
         const auto records = WaitForRecords(m_log, started, 60000);
         ASSERT_EQ(records.size(), started) << "the Inspect stand-in's start record";
         EXPECT_EQ(records.back().exe, m_dir + "\\Quenta Inspect Studio.exe");
