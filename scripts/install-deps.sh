@@ -46,6 +46,8 @@ packages=(
     dbus-bin
     dbus-x11
     lintian
+    wixl
+    msitools
     desktop-file-utils
     appstream
     xdg-utils

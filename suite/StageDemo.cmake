@@ -6,9 +6,14 @@
 # suite's stand-ins). It may be called from any directory of the build.
 
 set(VELTRONA_DEMO_DIR "${CMAKE_BINARY_DIR}/demo" CACHE INTERNAL "The demo installation")
-# The launcher runs from its own directory, so everything beside it shares this one.
-set(VELTRONA_INSTALL_DIR "${CMAKE_INSTALL_LIBDIR}/veltrona" CACHE INTERNAL
-    "The installed launcher's directory, relative to the prefix")
+# The launcher runs from its own directory, so everything beside it shares this one:
+# lib/veltrona below the prefix, or on Windows the prefix itself (the suite's folder).
+if(WIN32)
+    set(VELTRONA_INSTALL_DIR "" CACHE INTERNAL "The installed launcher's directory")
+else()
+    set(VELTRONA_INSTALL_DIR "${CMAKE_INSTALL_LIBDIR}/veltrona" CACHE INTERNAL
+        "The installed launcher's directory, relative to the prefix")
+endif()
 
 function(veltrona_stage_demo source destination)
     cmake_parse_arguments(PARSE_ARGV 2 stage "" "COMPONENT" "")
@@ -51,13 +56,14 @@ function(veltrona_stage_demo source destination)
 
     # Installed from the staged copy, since install(TARGETS) cannot rename and a staged
     # file may be a program made by a custom command. `cmake --install --strip` and the
-    # packages strip every ELF file.
+    # packages strip every ELF and PE file (with the target's strip in a cross build).
     get_filename_component(name "${destination}" NAME)
     get_filename_component(subdir "${destination}" DIRECTORY)
     set(installDir "${VELTRONA_INSTALL_DIR}")
-    if(subdir)
-        string(APPEND installDir "/${subdir}")
+    if(installDir AND subdir)
+        string(APPEND installDir "/")
     endif()
+    string(APPEND installDir "${subdir}")
     list(JOIN permissions " " permissions)
     string(CONFIGURE [=[
         file(INSTALL "@output@" DESTINATION "${CMAKE_INSTALL_PREFIX}/@installDir@"
@@ -65,7 +71,7 @@ function(veltrona_stage_demo source destination)
         if(CMAKE_INSTALL_DO_STRIP)
             set(installed "$ENV{DESTDIR}${CMAKE_INSTALL_PREFIX}/@installDir@/@name@")
             file(READ "${installed}" magic LIMIT 4 HEX)
-            if(magic STREQUAL "7f454c46")
+            if(magic MATCHES "^(7f454c46|4d5a)")
                 execute_process(COMMAND "@CMAKE_STRIP@" "${installed}" COMMAND_ERROR_IS_FATAL ANY)
             endif()
         endif()]=] code @ONLY)

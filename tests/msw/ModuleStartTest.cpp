@@ -13,6 +13,7 @@
 #include "support/ScopedEnv.h"
 #include "support/StandinDir.h"
 #include "support/StandinLog.h"
+#include "support/msw/ReaderButtons.h"
 
 #include <gtest/gtest.h>
 #include <wx/filefn.h>
@@ -20,7 +21,6 @@
 
 #include <windows.h>
 
-#include <oleacc.h>
 // The toolkit's names back from the system's macros (FindWindow).
 #include <wx/msw/winundef.h>
 
@@ -144,54 +144,6 @@ TEST_F(ModuleStartTest, RunningVerifyIsRestoredInsteadOfStarted)
         EXPECT_TRUE(SettledRecords(m_log, pid).empty());
     }
     wxKill(pid, wxSIGKILL);
-}
-
-// What a screen reader learns of one child window of the launcher through MSAA.
-struct ReaderButton
-{
-    std::string name;
-    std::string defaultAction;
-    IAccessible* accessible; // released by the caller
-};
-
-// The push buttons among the launcher's child windows, asked from this process: the
-// answers come from the launcher's process, marshalled by oleacc.
-std::vector<ReaderButton> ReaderButtons(HWND frame)
-{
-    std::vector<HWND> children;
-    EnumChildWindows(
-        frame,
-        [](HWND child, LPARAM list) -> BOOL {
-            reinterpret_cast<std::vector<HWND>*>(list)->push_back(child);
-            return TRUE;
-        },
-        reinterpret_cast<LPARAM>(&children));
-    std::vector<ReaderButton> buttons;
-    VARIANT self;
-    self.vt = VT_I4;
-    self.lVal = CHILDID_SELF;
-    for (const HWND child : children) {
-        IAccessible* accessible = nullptr;
-        if (FAILED(AccessibleObjectFromWindow(child, DWORD(OBJID_CLIENT), __uuidof(IAccessible),
-                                              reinterpret_cast<void**>(&accessible))))
-            continue;
-        VARIANT role;
-        VariantInit(&role);
-        BSTR name = nullptr, action = nullptr;
-        if (accessible->get_accRole(self, &role) == S_OK && role.vt == VT_I4 &&
-            role.lVal == ROLE_SYSTEM_PUSHBUTTON && accessible->get_accName(self, &name) == S_OK &&
-            accessible->get_accDefaultAction(self, &action) == S_OK) {
-            buttons.push_back(
-                {wxString(name).utf8_string(), wxString(action).utf8_string(), accessible});
-            accessible = nullptr;
-        }
-        SysFreeString(name);
-        SysFreeString(action);
-        VariantClear(&role);
-        if (accessible)
-            accessible->Release();
-    }
-    return buttons;
 }
 
 // The launcher in another process, as a screen reader sees it: each module button and
