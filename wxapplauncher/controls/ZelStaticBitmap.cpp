@@ -269,6 +269,10 @@ void ZelStaticBitmap::OnMouse(wxMouseEvent& event)
             n = STATE_PRESSED;
         else if (!inside && s != STATE_NORMAL)
             n = STATE_NORMAL;
+    } else if (event.Moving() && inside && s == STATE_NORMAL) {
+        // GTK reports no enter that comes with the end of another window's grab (a
+        // click on a neighbour just before): the first motion over the button shows it.
+        n = STATE_HOVER;
     }
 
     if (n != s) {
